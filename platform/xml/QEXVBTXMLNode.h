@@ -1,0 +1,99 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+
+// Why a document could not be read: the system's reason or a parse fault, with
+// the 1-based line and column of the fault (both 0 when there is no position,
+// as for a file that cannot be opened).
+struct XMLReadError {
+  std::string reason;
+  int line = 0;
+  int column = 0;
+};
+
+// A rewrite of one attribute value, as changeAttributeValues applies it: when
+// the value changes, the function fills `rewritten` and returns non-zero;
+// otherwise it returns 0 and leaves `rewritten` alone.
+using QEXAttributeRewrite = int (*)(std::string_view value, std::string& rewritten);
+
+// Opaque iteration position over the children of an element; null means "no
+// more". It points at the child that getNextNode will return.
+using QEXVBTXMLPosition = const void*;
+
+// An XML element: a tag, attributes in the order they were set, and child
+// elements in the order they were appended. An element owns its children and
+// its attribute values; text content is not kept.
+//
+// A document read by CreateFromFile keeps the file's bytes in one buffer owned
+// by its root: tags, names and values point into that buffer, so every element
+// of a document must be discarded with (or before) its root.
+class QEXVBTXMLNode {
+ public:
+  virtual ~QEXVBTXMLNode();
+  QEXVBTXMLNode(const QEXVBTXMLNode&) = delete;
+  QEXVBTXMLNode& operator=(const QEXVBTXMLNode&) = delete;
+
+  // Reads the XML document at `path` and returns its root element, or null with
+  // `error` filled when the file cannot be read or is not well-formed.
+  // Attribute values are handed over exactly as they stand between the quotes:
+  // entity references are not decoded and white space is not converted.
+  static std::unique_ptr<QEXVBTXMLNode> CreateFromFile(const char* path, XMLReadError& error);
+  // Parses a document held in memory; `text` is copied. Same contract as
+  // CreateFromFile.
+  static std::unique_ptr<QEXVBTXMLNode> CreateFromText(std::string_view text, XMLReadError& error);
+  // A new element without attributes or children.
+  static std::unique_ptr<QEXVBTXMLNode> CreateNode(const char* tag);
+
+  const char* getTag() const;
+
+  // The value of attribute `name`, or null when the element has none. The
+  // pointer stays valid until the value is set again or the element is
+  // discarded. The second parameter is unused.
+  const char* getAttributeValue(const char* name, const void* unused = nullptr) const;
+  // Adds attribute `name` at the end, or replaces the value of an existing one
+  // in place. Both strings are copied.
+  void setAttributeValue(const char* name, const char* value);
+
+  // Appends `child` as the last child and takes ownership of it. Returns the
+  // child, which stays valid as long as this element keeps it.
+  QEXVBTXMLNode* insertNodeAtEnd(std::unique_ptr<QEXVBTXMLNode> child);
+  // Detaches `child` (a direct child of this element) and discards it with its
+  // subtree.
+  void removeNode(QEXVBTXMLNode* child);
+
+  // Iteration over the direct children: the position of the first child, or
+  // null when there is none. The parameter is unused.
+  QEXVBTXMLPosition getFirstNodePosition(const void* unused = nullptr) const;
+  // Returns the child at `position` and moves `position` to the next child
+  // (null after the last). Removing the child just returned does not disturb
+  // the iteration. The second parameter is unused.
+  QEXVBTXMLNode* getNextNode(QEXVBTXMLPosition& position, const void* unused = nullptr) const;
+
+  // Writes this element and its subtree to `path` as a UTF-8 XML document with
+  // an XML declaration, indented, attributes in their order and values exactly
+  // as held (callers escape them first). A regular file (or a new path) is
+  // written to a temporary file beside it and renamed into place, so a failed
+  // write never leaves a truncated document; a path that exists and is not a
+  // regular file by lstat (a symbolic link, a device, a pipe) is written
+  // directly and never replaced. Returns 0, or non-zero with `error` filled
+  // (the system's reason) when the document cannot be written.
+  int writeInFile(const char* path, std::string& error) const;
+  // The same document as writeInFile would write, appended to `out`.
+  void writeTo(std::string& out) const;
+
+ protected:
+  explicit QEXVBTXMLNode(const char* tag);
+
+ private:
+  friend void changeAttributeValues(QEXVBTXMLNode* root, QEXAttributeRewrite rewrite);
+  friend class XMLReader;
+  // Representation: chosen for reading large documents in place (see the
+  // source file).
+};
+
+// Applies `rewrite` to every attribute value of `root` and of all its
+// descendants, in document order; a rewritten value replaces the old one.
+void changeAttributeValues(QEXVBTXMLNode* root, QEXAttributeRewrite rewrite);

@@ -1,0 +1,3 @@
+#include "rules/FrameworkComparison.h"
+
+int CompareFrameworks(const QEXVBTXMLNode*, const QEXVBTXMLNode*, QEXVBTXMLNode*&) { return 0; }

@@ -1,0 +1,56 @@
+#!/usr/bin/env bash
+# Runs one end-to-end case: a folder holding the command's arguments and its
+# inputs, and the output expected of it.
+#
+#   args               one argument per line, paths relative to the folder
+#   expected.status    the exit status (0 when absent)
+#   expected.stdout    standard output (empty when absent)
+#   expected.stderr    standard error (empty when absent)
+#   expected.report.xml  when present, compared with the file out.xml
+#   expected.help.htm    when present, compared with the file help.htm
+#   setup.sh           when present, run (with bash) in the working copy first
+#
+# The case runs in a fresh copy of its folder, with the program named
+# "zor2check" whatever its path, and every expected file must match byte for
+# byte.
+set -u
+bin=$1
+case_dir=$2
+
+work=$(mktemp -d)
+trap 'chmod -R u+rwX "$work" 2>/dev/null; rm -rf "$work"' EXIT
+cp -R "$case_dir/." "$work/"
+cd "$work" || exit 1
+[ -f setup.sh ] && { bash setup.sh || { echo "setup.sh failed"; exit 1; }; }
+
+args=()
+[ -f args ] && mapfile -t args < args
+(exec -a zor2check "$bin" "${args[@]}") > actual.stdout 2> actual.stderr < /dev/null
+status=$?
+
+failed=0
+expect() {  # expect <expected file> <actual file>
+  local expected=$1 actual=$2
+  if [ ! -e "$actual" ]; then
+    echo "--- $actual was not written"
+    failed=1
+  elif ! cmp -s "$expected" "$actual"; then
+    echo "--- $actual differs from $expected:"
+    diff -u "$expected" "$actual" | head -n 60
+    failed=1
+  fi
+}
+
+want_status=0
+[ -f expected.status ] && want_status=$(cat expected.status)
+if [ "$status" != "$want_status" ]; then
+  echo "--- exit status $status, expected $want_status"
+  failed=1
+fi
+[ -f expected.stdout ] || : > expected.stdout
+[ -f expected.stderr ] || : > expected.stderr
+expect expected.stdout actual.stdout
+expect expected.stderr actual.stderr
+[ -f expected.report.xml ] && expect expected.report.xml out.xml
+[ -f expected.help.htm ] && expect expected.help.htm help.htm
+exit $failed
