@@ -16,7 +16,9 @@ class TAIndex {
   int Count() const { return static_cast<int>(entries_.size()); }
   // Position from 0 to Count() - 1.
   void* ValueAt(int position) const { return entries_[static_cast<size_t>(position)].value; }
-  const std::string& KeyAt(int position) const { return entries_[static_cast<size_t>(position)].key; }
+  const std::string& KeyAt(int position) const {
+    return entries_[static_cast<size_t>(position)].key;
+  }
 
  private:
   struct Entry {

@@ -1,0 +1,62 @@
+#include "platform/tools/XMLString.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+// The decoded text, or "<unchanged>" when decodeXMLString reports no change.
+std::string Decoded(std::string_view value) {
+  std::string out = "<unchanged>";
+  int result = decodeXMLString(value, out);
+  EXPECT_EQ(result != 0, out != "<unchanged>") << value;
+  return out;
+}
+
+}  // namespace
+
+TEST(EncodeXMLStringTest, EscapesMarkupQuotesAndLineBlanks) {
+  std::string out = "untouched";
+  EXPECT_EQ(encodeXMLString("plain text (0)", out), 0);
+  EXPECT_EQ(out, "untouched");
+  EXPECT_EQ(encodeXMLString("", out), 0);
+
+  ASSERT_EQ(encodeXMLString("a&b<c>d\"e'f\tg\nh\ri", out), 1);
+  EXPECT_EQ(out, "a&amp;b&lt;c&gt;d&quot;e&apos;f&#9;g&#10;h&#13;i");
+  ASSERT_EQ(encodeXMLString("<BR>\t\t- x", out), 1);
+  EXPECT_EQ(out, "&lt;BR&gt;&#9;&#9;- x");
+}
+
+TEST(DecodeXMLStringTest, DecodesNamedAndCharacterReferences) {
+  EXPECT_EQ(Decoded("no reference"), "<unchanged>");
+  EXPECT_EQ(Decoded("&amp;&lt;&gt;&quot;&apos;"), "&<>\"'");
+  EXPECT_EQ(Decoded("&#65;&#x41;&#x4a;&#x4A;&#0065;"), "AAJJA");
+  EXPECT_EQ(Decoded("&#9;&#10;&#13;"), "\t\n\r");
+  EXPECT_EQ(Decoded("&#xE9;"), "\xC3\xA9");
+  EXPECT_EQ(Decoded("&#x20AC;"), "\xE2\x82\xAC");
+  EXPECT_EQ(Decoded("&#x10FFFF;"), "\xF4\x8F\xBF\xBF");
+  EXPECT_EQ(Decoded("&#1114111;"), "\xF4\x8F\xBF\xBF");
+  // One pass: decoded text is not decoded again.
+  EXPECT_EQ(Decoded("&amp;lt;"), "&lt;");
+  EXPECT_EQ(Decoded("&&amp;"), "&&");
+}
+
+TEST(DecodeXMLStringTest, LeavesMalformedReferencesAsTheyStand) {
+  for (const char* bad :
+       {"&", "&amp", "& amp;", "&AMP;", "&nbsp;", "&#;", "&#x;", "&#X41;", "&#65", "&#6 5;",
+        "&#x4G;", "&#0;", "&#xD800;", "&#xDFFF;", "&#x110000;", "&#1114112;",
+        "&#99999999999999999999999;", "&#x00000000000000000000000FFFFFFFF41;"}) {
+    EXPECT_EQ(Decoded(bad), "<unchanged>") << bad;
+  }
+  EXPECT_EQ(Decoded("&bad; &lt; &#0;"), "&bad; < &#0;");
+  // Leading zeros are digits like any other, however many.
+  EXPECT_EQ(Decoded("&#x" + std::string(1000, '0') + "41;"), "A");
+}
+
+TEST(XMLStringTest, EncodeThenDecodeGivesTheValueBack) {
+  const std::string value = "if (a < b && c > 'd') \"e\"\t\r\n&#65; &amp; \xC3\xA9";
+  std::string encoded;
+  ASSERT_EQ(encodeXMLString(value, encoded), 1);
+  std::string decoded;
+  ASSERT_EQ(decodeXMLString(encoded, decoded), 1);
+  EXPECT_EQ(decoded, value);
+}
