@@ -5,6 +5,9 @@
 #include <string>
 #include <string_view>
 
+class Arena;
+struct ParsedDocument;
+
 // Why a document could not be read: the system's reason or a parse fault, with
 // the 1-based line and column of the fault (both 0 when there is no position,
 // as for a file that cannot be opened).
@@ -92,6 +95,54 @@ class QEXVBTXMLNode {
   friend class XMLReader;
   // Representation: chosen for reading large documents in place (see the
   // source file).
+  struct Extra;
+  struct RewritePass;
+  struct ParsedTag {};
+  static constexpr uintptr_t kHasExtra = 1;
+
+  // An element of a parsed document, placed in its document's node arena.
+  QEXVBTXMLNode(const char* block, ParsedTag) noexcept;
+  static QEXVBTXMLNode* NewParsedNode(Arena& nodes, const char* block);
+  // Makes this (built) element the root of a parsed document, which it owns.
+  void AdoptDocument(std::unique_ptr<ParsedDocument> document);
+  void SetParsedBlock(const char* block);
+  // Appends a parsed child after `last`, the parent's last child (or null).
+  static void AppendParsed(QEXVBTXMLNode* parent, QEXVBTXMLNode* last, QEXVBTXMLNode* child) {
+    if (last != nullptr) {
+      last->SetNext(child);
+    } else {
+      parent->first_child_ = child;
+    }
+  }
+
+  QEXVBTXMLNode* next() const { return reinterpret_cast<QEXVBTXMLNode*>(next_ & ~kHasExtra); }
+  void SetNext(QEXVBTXMLNode* next) {
+    next_ = reinterpret_cast<uintptr_t>(next) | (next_ & kHasExtra);
+  }
+  Extra* extra() const;
+  Extra& EnsureExtra();
+  const char* block() const;
+  void SetBlock(const char* block);
+  bool IsHeapNode() const;
+  bool OwnsDocument() const;
+  QEXVBTXMLNode* LastChild();
+  QEXVBTXMLNode* PreviousSibling(QEXVBTXMLNode* child, bool& is_child) const;
+
+  Extra& OwnedAttributes();
+  void SetOwnedValue(const char* name, std::string_view value);
+  void RewriteValues(RewritePass& pass);
+  void RewriteBlock(RewritePass& pass);
+  void RebuildBlock(RewritePass& pass);
+  void AppendStartTag(std::string& out) const;
+  static void DiscardList(QEXVBTXMLNode* first);
+
+  // The tag, followed by the attributes of a parsed element (see
+  // DocumentStorage.h); or, when next_ carries kHasExtra, this element's
+  // Extra, which it owns.
+  const void* data_;
+  // The next sibling, with kHasExtra in its lowest bit.
+  uintptr_t next_;
+  QEXVBTXMLNode* first_child_ = nullptr;
 };
 
 // Applies `rewrite` to every attribute value of `root` and of all its
