@@ -1,0 +1,1 @@
+echo old > target.xml && ln -s target.xml out.xml
