@@ -1,0 +1,131 @@
+#include "rules/MethodRecords.h"
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <string_view>
+#include <vector>
+
+namespace {
+
+// The records of the "Method" children of a "Class" document.
+class MethodRecordsTest : public ::testing::Test {
+ protected:
+  std::vector<MethodInfo> Read(std::string_view text) {
+    XMLReadError error;
+    document_ = QEXVBTXMLNode::CreateFromText(text, error);
+    EXPECT_NE(document_, nullptr) << error.reason;
+    std::vector<MethodInfo> methods;
+    QEXVBTXMLPosition position = document_->getFirstNodePosition();
+    while (position != nullptr)
+      methods.push_back(BuildMethodInfo(*document_->getNextNode(position)));
+    return methods;
+  }
+  std::unique_ptr<QEXVBTXMLNode> document_;
+};
+
+TEST_F(MethodRecordsTest, ReadsMethodAttributesAndArgumentsInOrder) {
+  auto m = Read(R"xml(<Class>
+    <Method Name="Get" Access="Public" ReturnedType="int" Signature="int Get(long a, int b)"
+            Property="RW" @nodoc="" Deprecated="M4R18">
+      <Arg Type="long" Name="a" Value="0" Retval=""/>
+      <Other Type="skipped"/>
+      <Arg Type="int"><Arg Type="nested"/></Arg>
+    </Method>
+  </Class>)xml");
+  ASSERT_EQ(m.size(), 1u);
+  EXPECT_STREQ(m[0].name, "Get");
+  EXPECT_STREQ(m[0].access, "Public");
+  EXPECT_STREQ(m[0].returnedType, "int");
+  EXPECT_STREQ(m[0].signature, "int Get(long a, int b)");
+  EXPECT_EQ(m[0].property, 'R');
+  EXPECT_EQ(m[0].nodoc, 1);
+  EXPECT_EQ(m[0].deprecated, 18);
+  ASSERT_EQ(m[0].args.size(), 2u);
+  EXPECT_STREQ(m[0].args[0].type, "long");
+  EXPECT_STREQ(m[0].args[0].name, "a");
+  EXPECT_STREQ(m[0].args[0].value, "0");
+  EXPECT_TRUE(HasRetval(m[0].args[0]));
+  EXPECT_STREQ(m[0].args[1].type, "int");
+  EXPECT_EQ(m[0].args[1].name, nullptr);
+  EXPECT_EQ(m[0].args[1].value, nullptr);
+  EXPECT_FALSE(HasRetval(m[0].args[1]));
+}
+
+TEST_F(MethodRecordsTest, DefaultsPropertyAndDeprecation) {
+  auto m = Read(R"xml(<Class>
+    <Method Name="A"/>
+    <Method Name="B" Property="" Deprecated="M4R7"/>
+    <Method Name="C" Deprecated="M4R18a"/>
+    <Method Name="D" Deprecated="M4R"/>
+    <Method Name="E" Deprecated="R18"/>
+    <Method Name="F" Deprecated="M4R00"/>
+    <Method Name="G" Deprecated="xyz99999999999"/>
+  </Class>)xml");
+  ASSERT_EQ(m.size(), 7u);
+  EXPECT_EQ(m[0].property, 'N');
+  EXPECT_EQ(m[0].nodoc, 0);
+  EXPECT_EQ(m[0].deprecated, 0);
+  EXPECT_EQ(m[0].access, nullptr);
+  EXPECT_TRUE(m[0].args.empty());
+  EXPECT_EQ(m[1].property, '\0');
+  EXPECT_EQ(m[1].deprecated, 7);
+  EXPECT_EQ(m[2].deprecated, 0);
+  EXPECT_EQ(m[3].deprecated, 0);
+  EXPECT_EQ(m[4].deprecated, 0);
+  EXPECT_EQ(m[5].deprecated, 0);
+  EXPECT_EQ(m[6].deprecated, 2147483647);
+}
+
+TEST_F(MethodRecordsTest, OptionalTextPredicatesAreThreeWay) {
+  auto m = Read(R"xml(<Class>
+    <Method Name="A" ReturnedType="int"><Arg Type="int" Value="1"/><Arg/></Method>
+    <Method Name="B" ReturnedType="int"><Arg Type="int" Value="1"/><Arg/></Method>
+    <Method Name="C" ReturnedType="long"><Arg Type="long" Value="2"/><Arg Type="" Value=""/></Method>
+    <Method Name="D"><Arg/><Arg/></Method>
+  </Class>)xml");
+  ASSERT_EQ(m.size(), 4u);
+  EXPECT_TRUE(SameReturnedType(m[0], m[1]));
+  EXPECT_FALSE(SameReturnedType(m[0], m[2]));
+  EXPECT_FALSE(SameReturnedType(m[0], m[3]));
+  EXPECT_TRUE(SameReturnedType(m[3], m[3]));
+
+  EXPECT_TRUE(SameArgType(m[0].args[0], m[1].args[0]));
+  EXPECT_FALSE(SameArgType(m[0].args[0], m[2].args[0]));
+  EXPECT_TRUE(SameArgType(m[0].args[1], m[3].args[1]));   // both absent
+  EXPECT_FALSE(SameArgType(m[0].args[1], m[2].args[1]));  // absent against empty
+  EXPECT_FALSE(SameArgType(m[2].args[1], m[0].args[1]));
+
+  EXPECT_TRUE(SameDefaultValue(m[0].args[0], m[1].args[0]));
+  EXPECT_FALSE(SameDefaultValue(m[0].args[0], m[2].args[0]));
+  EXPECT_TRUE(SameDefaultValue(m[0].args[1], m[3].args[1]));
+  EXPECT_FALSE(SameDefaultValue(m[0].args[1], m[2].args[1]));
+  EXPECT_FALSE(SameDefaultValue(m[2].args[1], m[0].args[1]));
+}
+
+TEST_F(MethodRecordsTest, SameMethodIsNameAccessAndArgumentTypes) {
+  auto m = Read(R"xml(<Class>
+    <Method Name="F" Access="Public" ReturnedType="int" Property="P"><Arg Type="int" Name="x"/></Method>
+    <Method Name="F" Access="Public" ReturnedType="long" @nodoc="" Type="PureVirtual">
+      <Arg Type="int" Name="y" Value="3" Retval=""/></Method>
+    <Method Name="F" Access="Public"><Arg Type="long"/></Method>
+    <Method Name="F" Access="Protected"><Arg Type="int"/></Method>
+    <Method Name="F" Access="Public"><Arg Type="int"/><Arg Type="int"/></Method>
+    <Method Name="G" Access="Public"><Arg Type="int"/></Method>
+    <Method Name="F"><Arg Type="int"/></Method>
+    <Method Access="Public"><Arg Type="int"/></Method>
+    <Method Name="F" Access="Public"><Arg/></Method>
+  </Class>)xml");
+  ASSERT_EQ(m.size(), 9u);
+  EXPECT_TRUE(SameMethod(m[0], m[1]));   // only non-identity attributes differ
+  EXPECT_FALSE(SameMethod(m[0], m[2]));  // overload on an argument type
+  EXPECT_FALSE(SameMethod(m[0], m[3]));  // access
+  EXPECT_FALSE(SameMethod(m[0], m[4]));  // argument count
+  EXPECT_FALSE(SameMethod(m[0], m[5]));  // name
+  EXPECT_FALSE(SameMethod(m[6], m[6]));  // no access: not even itself
+  EXPECT_FALSE(SameMethod(m[7], m[7]));  // no name: not even itself
+  EXPECT_FALSE(SameMethod(m[0], m[8]));  // a typed argument against an untyped one
+  EXPECT_TRUE(SameMethod(m[8], m[8]));   // untyped arguments are alike
+}
+
+}  // namespace

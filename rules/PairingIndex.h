@@ -1,0 +1,52 @@
+#pragma once
+
+#include <cstddef>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+#include "platform/xml/QEXVBTXMLNode.h"
+#include "rules/MethodRecords.h"
+
+// Indexes of the checked side of one pairing level. Each answers what a scan
+// of the checked elements from the first one would find for a reference
+// element: the first match, never marked as taken, so that one checked element
+// can pair with several reference elements. Built once per level, so that
+// pairing costs time proportional to the size of the level. An index points
+// into what it was built from, which must outlive it and stay unchanged.
+
+// Pairs elements by their exact "Name".
+class NameIndex {
+ public:
+  // Indexes `elements`; elements without "Name" are left out, since they pair
+  // with nothing.
+  explicit NameIndex(const std::vector<QEXVBTXMLNode*>& elements);
+  // The first element whose "Name" equals `name`, or null (always null for a
+  // null `name`).
+  const QEXVBTXMLNode* Find(const char* name) const;
+
+ private:
+  std::unordered_map<std::string_view, const QEXVBTXMLNode*> first_;
+};
+
+// Pairs method records by SameMethod.
+class MethodIndex {
+ public:
+  static constexpr size_t npos = static_cast<size_t>(-1);
+
+  // Indexes `methods`.
+  explicit MethodIndex(const RecordList<MethodInfo>& methods);
+  // The position (from 0) of the first record n of the list for which
+  // SameMethod(m, n) holds, or npos.
+  size_t Find(const MethodInfo& m) const;
+  bool Contains(const MethodInfo& m) const { return Find(m) != npos; }
+
+ private:
+  struct IdentityHash {
+    size_t operator()(const MethodInfo* m) const;
+  };
+  struct IdentityEqual {
+    bool operator()(const MethodInfo* m, const MethodInfo* n) const { return SameMethod(*m, *n); }
+  };
+  std::unordered_map<const MethodInfo*, size_t, IdentityHash, IdentityEqual> first_;
+};
