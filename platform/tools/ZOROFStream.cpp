@@ -68,5 +68,9 @@ ZOROFStream& ZOROFStream::operator<<(int value) {
 }
 
 ZOROFStream& ZOROFStream::operator<<(ZOREndl) {
-  return *this << std::string_view("\n");
+  *this << std::string_view("\n");
+  // A standard stream is flushed line by line, so that the lines of the two
+  // log streams keep their order when both go to the same place.
+  if (!owned_) flush();
+  return *this;
 }
