@@ -10,8 +10,8 @@ inline constexpr ZOREndl endl{};
 
 // An output stream over C stdio: either a file it opened and owns, or one of
 // the process's standard streams, which it only borrows and flushes at every
-// line end. Write failures are
-// remembered rather than thrown, so that the caller can report them once.
+// line end. Write failures are remembered rather than thrown, so that the
+// caller can report them once.
 class ZOROFStream {
  public:
   ZOROFStream() = default;
