@@ -54,7 +54,7 @@ bool WriteAll(int fd, std::string_view bytes) {
 }
 
 int WriteDirectly(const char* path, std::string_view bytes, std::string& reason) {
-  FileDescriptor file(::open(path, O_WRONLY | O_TRUNC | O_NOCTTY | O_CLOEXEC));
+  FileDescriptor file(::open(path, O_WRONLY | O_CREAT | O_TRUNC | O_NOCTTY | O_CLOEXEC, 0666));
   if (file.get() < 0) return Fail(reason, errno);
   if (!WriteAll(file.get(), bytes)) return Fail(reason, errno);
   if (!file.Close()) return Fail(reason, errno);
