@@ -1,9 +1,13 @@
 #!/usr/bin/env bash
 # Installs the Debian packages the build and the tests need, when they are missing.
+# With --fuzz, also clang and its runtimes (sanitizers, libFuzzer) for the fuzz target.
 # Idempotent; run as root on Debian 12.
 set -euo pipefail
 
 packages=(cmake g++ make libgtest-dev)
+if [ "${1:-}" = "--fuzz" ]; then
+  packages+=(clang libclang-rt-14-dev)
+fi
 missing=()
 for p in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q "install ok installed" || missing+=("$p")

@@ -9,10 +9,13 @@
 #   expected.report.xml  when present, compared with the file out.xml
 #   expected.help.htm    when present, compared with the file help.htm
 #   setup.sh           when present, run (with bash) in the working copy first
+#   run_as             when present, a user name: run as root, the program runs
+#                      as that user, since file modes do not bind root
 #
 # The case runs in a fresh copy of its folder, with the program named
 # "zor2check" whatever its path, and every expected file must match byte for
-# byte.
+# byte. A case that cannot be arranged on this machine says so and exits
+# with 77 (skipped).
 set -u
 bin=$1
 case_dir=$2
@@ -23,9 +26,24 @@ cp -R "$case_dir/." "$work/"
 cd "$work" || exit 1
 [ -f setup.sh ] && { bash setup.sh || { echo "setup.sh failed"; exit 1; }; }
 
+# As another user, the program runs from a copy in the working folder, which
+# that user can reach and write whatever the build directory's modes.
+as_user=()
+if [ -f run_as ] && [ "$(id -u)" -eq 0 ]; then
+  user=$(cat run_as)
+  as_user=(setpriv "--reuid=$user" "--regid=$(id -g "$user" 2> /dev/null)" --clear-groups)
+  if ! command -v setpriv > /dev/null || ! "${as_user[@]}" true 2> /dev/null; then
+    echo "SKIPPED: cannot run the program as user $user here"
+    exit 77
+  fi
+  cp "$bin" "$work/.zor2check" && chmod 0755 "$work/.zor2check" && chmod 0777 "$work" || exit 1
+  bin=$work/.zor2check
+fi
+
 args=()
 [ -f args ] && mapfile -t args < args
-(exec -a zor2check "$bin" "${args[@]}") > actual.stdout 2> actual.stderr < /dev/null
+("${as_user[@]}" bash -c 'exec -a zor2check "$0" "$@"' "$bin" "${args[@]}") \
+  > actual.stdout 2> actual.stderr < /dev/null
 status=$?
 
 failed=0

@@ -1,0 +1,2 @@
+# A named pipe that no one writes to: reading it would wait for ever.
+mkfifo ref.xml
