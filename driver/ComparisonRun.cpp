@@ -1,14 +1,21 @@
 #include "driver/ComparisonRun.h"
 
+#include <sys/stat.h>
+
+#include <cerrno>
+#include <cstring>
 #include <memory>
 #include <optional>
 #include <string>
+#include <system_error>
+#include <thread>
+#include <utility>
+#include <vector>
 
 #include "documents/HelpPage.h"
 #include "documents/ReportDocument.h"
-#include "documents/TypeNameNormalization.h"
+#include "driver/PairLoading.h"
 #include "platform/tools/ReadDirectory.h"
-#include "platform/tools/XMLString.h"
 #include "platform/tools/ZOROFStream.h"
 #include "platform/xml/QEXVBTXMLNode.h"
 #include "rules/FrameworkComparison.h"
@@ -27,11 +34,41 @@ void ReportFailure(const TAFileName& path, const std::string& reason) {
   ZORerr << "ERROR: " << path.str() << ": " << reason << endl;
 }
 
+// Names `path` on the error log stream when it is neither a file nor a
+// directory; returns whether it is one of them.
+bool CheckInputKind(const TAFileName& path) {
+  struct stat status;
+  if (::stat(path.c_str(), &status) != 0) {
+    ReportFailure(path, std::strerror(errno));
+    return false;
+  }
+  if (S_ISREG(status.st_mode) || S_ISDIR(status.st_mode)) return true;
+  ReportFailure(path, "Not a regular file or directory");
+  return false;
+}
+
+// Says which input path makes the pair unusable, so that the user need not
+// guess from the progress line alone.
+void ReportUnusableInputs(const TAFileName& reference, const TAFileName& checked) {
+  const bool referenceKnown = CheckInputKind(reference);
+  const bool checkedKnown = CheckInputKind(checked);
+  if (!referenceKnown || !checkedKnown) return;
+  if (checked.IsDirectory()) {
+    ReportFailure(checked, "Is a directory, but the reference " + reference.str() + " is a file");
+  } else {
+    ReportFailure(checked,
+                  "Not a directory, but the reference " + reference.str() + " is a directory");
+  }
+}
+
 // One pass over the inputs: the shared report and whether anything failed.
 class ComparisonRun {
  public:
   explicit ComparisonRun(const RunConfiguration& config)
       : config_(config), report_(QEXVBTXMLNode::CreateNode("XmlDiff")) {}
+  ~ComparisonRun() {
+    if (discarding_.joinable()) discarding_.join();
+  }
 
   ExitStatus Run() {
     CompareInputs();
@@ -44,13 +81,14 @@ class ComparisonRun {
   void CompareInputs() {
     switch (ChooseInputMode(config_.referencePath, config_.checkedPath)) {
       case InputMode::kFilePair:
-        ComparePair(config_.referencePath, config_.checkedPath);
+        ComparePair(LoadPair(config_.referencePath, config_.checkedPath));
         return;
       case InputMode::kDirectoryPair:
         CompareDirectories();
         return;
       case InputMode::kUnusable:
         ZORout << " Pb with input (-r or -c) " << endl;
+        ReportUnusableInputs(config_.referencePath, config_.checkedPath);
         incomplete_ = true;
         return;
     }
@@ -65,45 +103,50 @@ class ComparisonRun {
       incomplete_ = true;
       return;
     }
+    std::vector<PairReader::Paths> pairs;
     for (int i = 1; i <= entries.Size(); ++i) {
       TAFileName checked = config_.checkedPath + entries[i].basename(1);
-      if (checked.IsFile()) ComparePair(entries[i], checked);
+      if (checked.IsFile()) pairs.emplace_back(entries[i], std::move(checked));
+    }
+    PairReader reader(std::move(pairs));
+    while (reader.HasNext()) ComparePair(reader.Next());
+  }
+
+  // Both documents are read even when the first fails, so that every fault
+  // is reported in one run, the reference document's first.
+  void ComparePair(LoadedPair pair) {
+    ReportLoadFault(pair.reference);
+    ReportLoadFault(pair.checked);
+    if (pair.reference.root && pair.checked.root) {
+      QEXVBTXMLNode* report = report_.get();
+      CompareFrameworks(pair.reference.root.get(), pair.checked.root.get(), report);
+    }
+    Discard(std::move(pair));
+  }
+
+  // Giving the memory of large documents back to the system takes a while, so
+  // it is done on another thread while the run goes on (or here, should no
+  // thread be available). The report holds copies of the values it mirrors,
+  // never pointers into the documents.
+  void Discard(LoadedPair pair) {
+    if (discarding_.joinable()) discarding_.join();
+    try {
+      discarding_ = std::thread(
+          [pair = std::move(pair)]() mutable { LoadedPair discarded(std::move(pair)); });
+    } catch (const std::system_error&) {
     }
   }
 
-  // The documents of a pair live only for the time of this call.
-  void ComparePair(const TAFileName& referencePath, const TAFileName& checkedPath) {
-    // Both documents are read even when the first fails, so that every fault
-    // is reported in one run.
-    std::unique_ptr<QEXVBTXMLNode> reference = Load(referencePath);
-    std::unique_ptr<QEXVBTXMLNode> checked = Load(checkedPath);
-    if (!reference || !checked) return;
-    Prepare(*reference, *checked);
-    QEXVBTXMLNode* report = report_.get();
-    CompareFrameworks(reference.get(), checked.get(), report);
-  }
-
-  std::unique_ptr<QEXVBTXMLNode> Load(const TAFileName& path) {
-    XMLReadError error;
-    std::unique_ptr<QEXVBTXMLNode> document = QEXVBTXMLNode::CreateFromFile(path.c_str(), error);
-    if (document) return document;
+  void ReportLoadFault(const LoadedDocument& document) {
+    if (document.root) return;
     incomplete_ = true;
+    const XMLReadError& error = document.error;
     if (error.line > 0) {
-      ZORerr << "ERROR: " << path.str() << ":" << error.line << ":" << error.column << ": "
+      ZORerr << "ERROR: " << document.path.str() << ":" << error.line << ":" << error.column << ": "
              << error.reason << endl;
     } else {
-      ReportFailure(path, error.reason);
+      ReportFailure(document.path, error.reason);
     }
-    return nullptr;
-  }
-
-  // Type names are normalised before entity references are decoded, so that
-  // the normalisation only ever sees the text as written in the document.
-  static void Prepare(QEXVBTXMLNode& reference, QEXVBTXMLNode& checked) {
-    changeAttributeValues(&reference, NormalizeTypeNames);
-    changeAttributeValues(&checked, NormalizeTypeNames);
-    changeAttributeValues(&reference, decodeXMLString);
-    changeAttributeValues(&checked, decodeXMLString);
   }
 
   void WriteReport() {
@@ -121,6 +164,7 @@ class ComparisonRun {
   const RunConfiguration& config_;
   std::unique_ptr<QEXVBTXMLNode> report_;
   bool incomplete_ = false;
+  std::thread discarding_;  // discards the documents of the last pair
 };
 
 }  // namespace

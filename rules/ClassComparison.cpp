@@ -4,11 +4,9 @@
 #include "rules/MethodComparison.h"
 #include "rules/NewPureVirtualMethods.h"
 #include "rules/PairingIndex.h"
-#include "rules/ReportMirror.h"
-#include "rules/ZOR2Error.h"
 
 int CompareClasses(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* checked,
-                   QEXVBTXMLNode*& report, int checkNewPureVirtual) {
+                   ReportMirror& report, int checkNewPureVirtual) {
   QEXVBTXMLSearch referenceQuery;
   referenceQuery.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "Class"});
   referenceQuery.searchStart(reference);
@@ -20,8 +18,8 @@ int CompareClasses(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* checked,
   const NameIndex checkedClasses(checkedQuery.matches());
   for (const QEXVBTXMLNode* cls : referenceQuery.matches()) {
     const char* name = cls->getAttributeValue("Name");
-    QEXVBTXMLNode* reportClass = MirrorElement(report, "Class");
-    MirrorAttribute(reportClass, "Name", name);
+    ReportMirror reportClass(report, "Class");
+    reportClass.CopyAttribute("Name", name);
 
     // A deprecated class is no exception: deleting it is reported as well.
     const QEXVBTXMLNode* counterpart = checkedClasses.Find(name);

@@ -1,11 +1,12 @@
 #pragma once
 
 #include "platform/xml/QEXVBTXMLNode.h"
+#include "rules/ReportMirror.h"
 
 // Compares the classes of a pair of "File" elements: pairs them by name,
-// appends a "Class" element under `report` (may be null: then nothing is
-// mirrored or recorded) for every reference class, reports deleted classes
+// mirrors a "Class" element under `report` (a walk without a report mirrors
+// and records nothing) for every reference class, reports deleted classes
 // (CHBD), and applies the method rules to every class pair, followed by the
 // new-pure-virtual rule when `checkNewPureVirtual` is non-zero. Returns 0.
 int CompareClasses(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* checked,
-                   QEXVBTXMLNode*& report, int checkNewPureVirtual);
+                   ReportMirror& report, int checkNewPureVirtual);

@@ -28,15 +28,13 @@ bool PassesFileFilter(const QEXVBTXMLNode& file) {
   return FirstWordIs(file.getAttributeValue("Aut"), "Y");
 }
 
-QEXVBTXMLNode* MirrorFile(QEXVBTXMLNode* reportGroup, const QEXVBTXMLNode& file) {
-  QEXVBTXMLNode* reportFile = MirrorElement(reportGroup, "File");
-  MirrorAttribute(reportFile, "Name", file.getAttributeValue("Name"));
+void MirrorFile(ReportMirror& reportFile, const QEXVBTXMLNode& file) {
+  reportFile.CopyAttribute("Name", file.getAttributeValue("Name"));
   if (OnlyFlaggedFiles) {
-    MirrorAttribute(reportFile, "@ZOR2Level", file.getAttributeValue("@ZOR2Level"));
-    MirrorAttribute(reportFile, "@ZOR2Usage", file.getAttributeValue("@ZOR2Usage"));
+    reportFile.CopyAttribute("@ZOR2Level", file.getAttributeValue("@ZOR2Level"));
+    reportFile.CopyAttribute("@ZOR2Usage", file.getAttributeValue("@ZOR2Usage"));
   }
-  MirrorAttribute(reportFile, "Aut", file.getAttributeValue("Aut"));
-  return reportFile;
+  reportFile.CopyAttribute("Aut", file.getAttributeValue("Aut"));
 }
 
 // A usage may stay the same or move from U1 to U2 and from U3 to U4 or U5; it
@@ -56,7 +54,7 @@ bool SameLevel(const char* reference, const char* checked) {
 // Applies the level and usage rules to a flagged file pair and answers whether
 // its classes must be checked for new pure virtual methods.
 int CheckLevelAndUsage(const QEXVBTXMLNode& reference, const QEXVBTXMLNode& checked,
-                       QEXVBTXMLNode*& reportFile) {
+                       ReportMirror& reportFile) {
   const bool exempt = RecentlyDeprecatedFile(reference);
   if (!SameLevel(reference.getAttributeValue("@ZOR2Level"),
                  checked.getAttributeValue("@ZOR2Level")) &&
@@ -91,10 +89,10 @@ bool RecentlyDeprecatedFile(const QEXVBTXMLNode& file) {
 }
 
 int CompareInterfaceFiles(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* checked,
-                          QEXVBTXMLNode*& report, const char* group) {
+                          ReportMirror& report, const char* group) {
   // The group is mirrored before any file is examined, even when empty.
-  QEXVBTXMLNode* reportGroup = MirrorElement(report, "Interfaces");
-  MirrorAttribute(reportGroup, "Name", group);
+  ReportMirror reportGroup(report, "Interfaces");
+  reportGroup.CopyAttribute("Name", group);
 
   using S = QEXVBTXMLSearch;
   QEXVBTXMLSearch referenceQuery;
@@ -111,7 +109,8 @@ int CompareInterfaceFiles(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* c
   const NameIndex checkedFiles(checkedQuery.matches());
   for (const QEXVBTXMLNode* file : referenceQuery.matches()) {
     if (!PassesFileFilter(*file)) continue;
-    QEXVBTXMLNode* reportFile = MirrorFile(reportGroup, *file);
+    ReportMirror reportFile(reportGroup, "File");
+    MirrorFile(reportFile, *file);
 
     const QEXVBTXMLNode* counterpart = checkedFiles.Find(file->getAttributeValue("Name"));
     if (counterpart == nullptr) {

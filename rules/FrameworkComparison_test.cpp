@@ -62,10 +62,43 @@ TEST(FrameworkComparisonTest, WalksAndLogsWithoutAReport) {
 TEST(FrameworkComparisonTest, ClassRulesAcceptNullElements) {
   auto reference = Parse(kReference);
   auto report = QEXVBTXMLNode::CreateNode("Class");
-  EXPECT_EQ(CompareMethods(nullptr, reference.get(), report.get()), 1);
-  EXPECT_EQ(CompareMethods(reference.get(), nullptr, report.get()), 1);
-  EXPECT_EQ(CheckNewPureVirtualMethods(nullptr, reference.get(), report.get()), 0);
+  ReportMirror reportClass(report.get());
+  EXPECT_EQ(CompareMethods(nullptr, reference.get(), reportClass), 1);
+  EXPECT_EQ(CompareMethods(reference.get(), nullptr, reportClass), 1);
+  EXPECT_EQ(CheckNewPureVirtualMethods(nullptr, reference.get(), reportClass), 0);
   EXPECT_EQ(report->getFirstNodePosition(), nullptr);
+}
+
+// Framework pairs may be compared on several threads: the report and the log
+// lines must still come in reference order.
+TEST(FrameworkComparisonTest, KeepsReferenceOrderAcrossManyFrameworks) {
+  std::string reference = "<W>";
+  std::string checked = "<W>";
+  std::string expectedLog;
+  for (int i = 0; i < 40; ++i) {
+    const std::string name = std::to_string(i);
+    // Every framework but each fifth has a counterpart and a deleted file.
+    reference.append("<Framework Name=\"F").append(name).append("\">");
+    reference.append("<Interfaces Name=\"Public\"><File Name=\"F").append(name);
+    reference.append(".h\" Aut=\"Y\"/></Interfaces></Framework>");
+    if (i % 5 == 4) continue;
+    checked.append("<Framework Name=\"F").append(name).append("\"/>");
+    expectedLog.append("Checking : F").append(name).append("\n");
+  }
+  auto referenceDocument = Parse((reference + "</W>").c_str());
+  auto checkedDocument = Parse((checked + "</W>").c_str());
+  auto root = QEXVBTXMLNode::CreateNode("XmlDiff");
+  QEXVBTXMLNode* report = root.get();
+  testing::internal::CaptureStdout();
+  CompareFrameworks(referenceDocument.get(), checkedDocument.get(), report);
+  ZORout.flush();
+  EXPECT_EQ(testing::internal::GetCapturedStdout(), expectedLog);
+  std::string names;
+  QEXVBTXMLPosition position = root->getFirstNodePosition();
+  while (position != nullptr) names += root->getNextNode(position)->getAttributeValue("Name");
+  EXPECT_EQ(names,
+            "F0F1F2F3F5F6F7F8F10F11F12F13F15F16F17F18F20F21F22F23F25F26F27F28F30F31F32F33"
+            "F35F36F37F38");
 }
 
 }  // namespace

@@ -8,8 +8,6 @@
 #include "rules/CheckSettings.h"
 #include "rules/MethodLists.h"
 #include "rules/PairingIndex.h"
-#include "rules/ReportMirror.h"
-#include "rules/ZOR2Error.h"
 
 namespace {
 
@@ -29,7 +27,7 @@ bool PropertyModifierChanged(char reference, char checked) {
   return reference != checked && (reference == 'P' || checked == 'N');
 }
 
-void CompareArguments(const MethodInfo& m, const MethodInfo& n, QEXVBTXMLNode* reportMethod) {
+void CompareArguments(const MethodInfo& m, const MethodInfo& n, ReportMirror& reportMethod) {
   if (m.args.size() != n.args.size()) {
     // SameMethod paired them, so their argument counts cannot differ.
     ZORerr << " PB : Methods should be the same, but nb of args are differents" << endl;
@@ -40,9 +38,10 @@ void CompareArguments(const MethodInfo& m, const MethodInfo& n, QEXVBTXMLNode* r
     const ArgInfo& a = m.args[k];
     const ArgInfo& b = n.args[k];
     if (!SameDefaultValue(a, b)) {
-      QEXVBTXMLNode* reportArg = MirrorElement(reportMethod, "Arg");
-      MirrorAttribute(reportArg, "Name", ("Arg_" + toString(static_cast<int>(k + 1))).c_str());
-      MirrorAttribute(reportArg, "Type", a.type);
+      const std::string name = "Arg_" + toString(static_cast<int>(k + 1));
+      ReportMirror reportArg(reportMethod, "Arg");
+      reportArg.CopyAttribute("Name", name.c_str());
+      reportArg.CopyAttribute("Type", a.type);
       AddError(reportArg, "ADVHC");
     }
     if (!retvalReported && HasRetval(a) != HasRetval(b)) {
@@ -55,7 +54,7 @@ void CompareArguments(const MethodInfo& m, const MethodInfo& n, QEXVBTXMLNode* r
 // The rules for a reference method m at position i whose counterpart n is at
 // position j of the checked list.
 void CompareMethodPair(const MethodInfo& m, size_t i, const MethodInfo& n, size_t j,
-                       bool automation, bool& orderReported, QEXVBTXMLNode* reportMethod) {
+                       bool automation, bool& orderReported, ReportMirror& reportMethod) {
   if (automation) {
     if (!orderReported && j != i) {
       orderReported = true;
@@ -71,7 +70,7 @@ void CompareMethodPair(const MethodInfo& m, size_t i, const MethodInfo& n, size_
 }  // namespace
 
 int CompareMethods(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* checked,
-                   QEXVBTXMLNode* report) {
+                   ReportMirror& report) {
   if (reference == nullptr || checked == nullptr) return 1;
   const char* referenceAut = reference->getAttributeValue("Aut");
   const char* checkedAut = checked->getAttributeValue("Aut");
@@ -89,7 +88,8 @@ int CompareMethods(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* checked,
     const MethodInfo& m = referenceMethods[i];
     if (PassedOverAsDeprecated(m)) continue;
     const size_t j = counterparts.Find(m);
-    QEXVBTXMLNode* reportMethod = MirrorMethod(report, m);
+    ReportMirror reportMethod(report, "Method");
+    MirrorMethod(reportMethod, m);
     if (j == MethodIndex::npos) {
       AddError(reportMethod, "MHBDM");
       continue;

@@ -3,56 +3,59 @@
 #include <cstring>
 
 #include "platform/tools/ZOROFStream.h"
-#include "platform/xml/QEXVBTXMLSearch.h"
 
 namespace {
 
-void LogMissing(const char* attribute, const QEXVBTXMLNode& method, ClassSide side) {
+void LogMissing(const char* attribute, const MethodInfo& method, ClassSide side) {
   ZORerr << "  No " << attribute << " found for method "
-         << (side == ClassSide::Reference ? "(ref)" : "(check)") << " : "
-         << method.getAttributeValue("Name") << endl;
+         << (side == ClassSide::Reference ? "(ref)" : "(check)") << " : " << method.name << endl;
 }
 
 bool IsPublicOrProtected(const char* access) {
   return std::strcmp(access, "Public") == 0 || std::strcmp(access, "Protected") == 0;
 }
 
+// Calls `visit` with the record of each "Method" child of `cls`, in order,
+// holding its attributes only: the arguments of a method that is kept are
+// read then.
+template <typename Visit>
+void ForEachMethod(const QEXVBTXMLNode& cls, Visit visit) {
+  for (QEXVBTXMLPosition p = cls.getFirstNodePosition(); p != nullptr;) {
+    const QEXVBTXMLNode& child = *cls.getNextNode(p);
+    if (std::strcmp(child.getTag(), "Method") == 0) visit(ReadMethodAttributes(child));
+  }
+}
+
+void Keep(RecordList<MethodInfo>& methods, MethodInfo&& method) {
+  ReadArguments(method);
+  methods.push_back(std::move(method));
+}
+
 }  // namespace
 
 RecordList<MethodInfo> ComparableMethods(const QEXVBTXMLNode& cls, ClassSide side) {
-  QEXVBTXMLSearch query;
-  query.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "Method"});
-  query.searchStart(&cls);
   RecordList<MethodInfo> methods;
-  for (const QEXVBTXMLNode* method : query.matches()) {
-    const char* signature = method->getAttributeValue("Signature");
-    const char* access = method->getAttributeValue("Access");
-    if (signature != nullptr && access != nullptr) {
-      if (IsPublicOrProtected(access)) methods.push_back(BuildMethodInfo(*method));
-      continue;
+  ForEachMethod(cls, [&methods, side](MethodInfo&& method) {
+    if (method.signature != nullptr && method.access != nullptr) {
+      if (IsPublicOrProtected(method.access)) Keep(methods, std::move(method));
+      return;
     }
-    if (signature == nullptr) LogMissing("signature", *method, side);
-    if (access == nullptr) LogMissing("Access", *method, side);
-  }
+    if (method.signature == nullptr) LogMissing("signature", method, side);
+    if (method.access == nullptr) LogMissing("Access", method, side);
+  });
   return methods;
 }
 
 RecordList<MethodInfo> PureVirtualMethods(const QEXVBTXMLNode& cls, ClassSide side) {
-  QEXVBTXMLSearch query;
-  query.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "Method"});
-  query.searchStart(&cls);
   RecordList<MethodInfo> methods;
-  for (const QEXVBTXMLNode* method : query.matches()) {
-    const char* signature = method->getAttributeValue("Signature");
-    const char* access = method->getAttributeValue("Access");
-    const char* type = method->getAttributeValue("Type");
-    if (signature != nullptr && access != nullptr && type != nullptr) {
-      if (std::strcmp(type, "PureVirtual") == 0) methods.push_back(BuildMethodInfo(*method));
-      continue;
+  ForEachMethod(cls, [&methods, side](MethodInfo&& method) {
+    if (method.signature != nullptr && method.access != nullptr && method.type != nullptr) {
+      if (std::strcmp(method.type, "PureVirtual") == 0) Keep(methods, std::move(method));
+      return;
     }
-    if (signature == nullptr) LogMissing("signature", *method, side);
-    if (access == nullptr) LogMissing("Access", *method, side);
-    if (type == nullptr) LogMissing("Type", *method, side);
-  }
+    if (method.signature == nullptr) LogMissing("signature", method, side);
+    if (method.access == nullptr) LogMissing("Access", method, side);
+    if (method.type == nullptr) LogMissing("Type", method, side);
+  });
   return methods;
 }

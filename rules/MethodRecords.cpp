@@ -1,9 +1,9 @@
 #include "rules/MethodRecords.h"
 
 #include <cstring>
+#include <string_view>
 
 #include "documents/InterfaceDocument.h"
-#include "platform/xml/QEXVBTXMLSearch.h"
 
 namespace {
 
@@ -14,6 +14,10 @@ bool SameOptionalText(const char* a, const char* b) {
   return std::strcmp(a, b) == 0;
 }
 
+bool IsArg(const QEXVBTXMLNode& element) {
+  return std::strcmp(element.getTag(), "Arg") == 0;
+}
+
 // Equality of two texts that must both be present.
 bool SamePresentText(const char* a, const char* b) {
   return a != nullptr && b != nullptr && std::strcmp(a, b) == 0;
@@ -22,32 +26,59 @@ bool SamePresentText(const char* a, const char* b) {
 }  // namespace
 
 ArgInfo BuildArgInfo(const QEXVBTXMLNode& arg) {
+  enum { kType, kName, kValue, kRetval, kCount };
+  static constexpr std::string_view kNames[kCount] = {"Type", "Name", "Value", "Retval"};
+  const char* values[kCount];
+  arg.getAttributeValues(kNames, values);
   ArgInfo info;
   info.element = &arg;
-  info.type = arg.getAttributeValue("Type");
-  info.name = arg.getAttributeValue("Name");
-  info.value = arg.getAttributeValue("Value");
-  info.retval = arg.getAttributeValue("Retval");
+  info.type = values[kType];
+  info.name = values[kName];
+  info.value = values[kValue];
+  info.retval = values[kRetval];
   return info;
 }
 
 MethodInfo BuildMethodInfo(const QEXVBTXMLNode& method) {
+  MethodInfo info = ReadMethodAttributes(method);
+  ReadArguments(info);
+  return info;
+}
+
+MethodInfo ReadMethodAttributes(const QEXVBTXMLNode& method) {
+  // Asked for in the order in which documents hold them, which is what
+  // getAttributeValues is quickest with.
+  enum { kName, kAccess, kReturnedType, kSignature, kType, kNodoc, kProperty, kDeprecated, kCount };
+  static constexpr std::string_view kNames[kCount] = {
+      "Name", "Access", "ReturnedType", "Signature", "Type", "@nodoc", "Property", "Deprecated"};
+  const char* values[kCount];
+  method.getAttributeValues(kNames, values);
   MethodInfo info;
   info.element = &method;
-  info.name = method.getAttributeValue("Name");
-  info.access = method.getAttributeValue("Access");
-  info.returnedType = method.getAttributeValue("ReturnedType");
-  info.signature = method.getAttributeValue("Signature");
-  if (method.getAttributeValue("@nodoc") != nullptr) info.nodoc = 1;
-  if (const char* property = method.getAttributeValue("Property")) info.property = property[0];
-  info.deprecated = ReleaseFromFourthCharacter(method.getAttributeValue("Deprecated"));
-
-  QEXVBTXMLSearch search;
-  search.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "Arg"});
-  search.searchStart(&method);
-  info.args.reserve(search.matches().size());
-  for (const QEXVBTXMLNode* arg : search.matches()) info.args.push_back(BuildArgInfo(*arg));
+  info.name = values[kName];
+  info.access = values[kAccess];
+  info.returnedType = values[kReturnedType];
+  info.signature = values[kSignature];
+  info.type = values[kType];
+  if (values[kNodoc] != nullptr) info.nodoc = 1;
+  if (const char* property = values[kProperty]) info.property = property[0];
+  info.deprecated = ReleaseFromFourthCharacter(values[kDeprecated]);
   return info;
+}
+
+void ReadArguments(MethodInfo& method) {
+  const QEXVBTXMLNode& element = *method.element;
+  // The "Arg" children, counted first so that the list is allocated once.
+  size_t count = 0;
+  for (QEXVBTXMLPosition p = element.getFirstNodePosition(); p != nullptr;) {
+    if (IsArg(*element.getNextNode(p))) ++count;
+  }
+  method.args.clear();
+  method.args.reserve(count);
+  for (QEXVBTXMLPosition p = element.getFirstNodePosition(); p != nullptr;) {
+    const QEXVBTXMLNode& child = *element.getNextNode(p);
+    if (IsArg(child)) method.args.push_back(BuildArgInfo(child));
+  }
 }
 
 bool SameArgType(const ArgInfo& a, const ArgInfo& b) {

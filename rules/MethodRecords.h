@@ -30,6 +30,7 @@ struct MethodInfo {
   const char* access = nullptr;        // "Access"
   const char* returnedType = nullptr;  // "ReturnedType"
   const char* signature = nullptr;     // "Signature"
+  const char* type = nullptr;          // "Type": the kind, such as "PureVirtual"
   // First character of "Property" ('\0' for an empty value), 'N' without it.
   char property = 'N';
   RecordList<ArgInfo> args;  // one per "Arg" child, in document order
@@ -41,6 +42,11 @@ struct MethodInfo {
 ArgInfo BuildArgInfo(const QEXVBTXMLNode& arg);
 // Reads one "Method" element (not null) with its "Arg" children.
 MethodInfo BuildMethodInfo(const QEXVBTXMLNode& method);
+// The two halves of BuildMethodInfo, for callers that pick methods by their
+// attributes first: the record of the element's attributes, with no
+// arguments, and then the arguments, read from the record's element.
+MethodInfo ReadMethodAttributes(const QEXVBTXMLNode& method);
+void ReadArguments(MethodInfo& method);
 
 // The two argument types are both absent, or both present and equal.
 bool SameArgType(const ArgInfo& a, const ArgInfo& b);

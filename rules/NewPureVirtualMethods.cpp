@@ -2,11 +2,9 @@
 
 #include "rules/MethodLists.h"
 #include "rules/PairingIndex.h"
-#include "rules/ReportMirror.h"
-#include "rules/ZOR2Error.h"
 
 int CheckNewPureVirtualMethods(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* checked,
-                               QEXVBTXMLNode* report) {
+                               ReportMirror& report) {
   if (reference == nullptr || checked == nullptr) return 0;
   const RecordList<MethodInfo> referenceMethods =
       PureVirtualMethods(*reference, ClassSide::Reference);
@@ -16,7 +14,8 @@ int CheckNewPureVirtualMethods(const QEXVBTXMLNode* reference, const QEXVBTXMLNo
   const MethodIndex declared(referenceMethods);
   for (const MethodInfo& n : checkedMethods) {
     if (declared.Contains(n)) continue;
-    QEXVBTXMLNode* reportMethod = MirrorMethod(report, n);
+    ReportMirror reportMethod(report, "Method");
+    MirrorMethod(reportMethod, n);
     AddError(reportMethod, "NPVM");
   }
   return 0;

@@ -1,6 +1,6 @@
 #include "rules/PairingIndex.h"
 
-#include <functional>
+#include <algorithm>
 
 NameIndex::NameIndex(const std::vector<QEXVBTXMLNode*>& elements) {
   first_.reserve(elements.size());
@@ -24,33 +24,34 @@ bool HasIdentity(const MethodInfo& m) {
   return m.name != nullptr && m.access != nullptr;
 }
 
-size_t Combine(size_t seed, size_t value) {
-  return seed ^ (value + 0x9e3779b97f4a7c15ULL + (seed << 6) + (seed >> 2));
+// Equal for records that SameMethod pairs. Only the name, the access and the
+// argument count go in: one pass over two short texts, while the few
+// overloads that share all three are told apart by SameMethod.
+size_t IdentityHash(const MethodInfo& m) {
+  size_t hash = 14695981039346656037ULL;  // FNV-1a
+  auto add = [&hash](unsigned char byte) { hash = (hash ^ byte) * 1099511628211ULL; };
+  for (const char* c = m.name; *c != '\0'; ++c) add(*c);
+  add('\0');
+  for (const char* c = m.access; *c != '\0'; ++c) add(*c);
+  return hash ^ m.args.size();
 }
 
 }  // namespace
 
-size_t MethodIndex::IdentityHash::operator()(const MethodInfo* m) const {
-  std::hash<std::string_view> text;
-  size_t seed = Combine(text(m->name), text(m->access));
-  seed = Combine(seed, m->args.size());
-  for (const ArgInfo& arg : m->args) {
-    // An absent type must hash apart from an empty one, as SameArgType tells
-    // them apart.
-    seed = Combine(seed, arg.type == nullptr ? 0x5bd1e995 : text(arg.type));
-  }
-  return seed;
-}
-
-MethodIndex::MethodIndex(const RecordList<MethodInfo>& methods) {
-  first_.reserve(methods.size());
+MethodIndex::MethodIndex(const RecordList<MethodInfo>& methods) : methods_(methods) {
+  entries_.reserve(methods.size());
   for (size_t i = 0; i < methods.size(); ++i) {
-    if (HasIdentity(methods[i])) first_.try_emplace(&methods[i], i);  // keeps the first
+    if (HasIdentity(methods[i])) entries_.push_back({IdentityHash(methods[i]), i});
   }
+  std::sort(entries_.begin(), entries_.end());
 }
 
 size_t MethodIndex::Find(const MethodInfo& m) const {
   if (!HasIdentity(m)) return npos;
-  auto found = first_.find(&m);
-  return found == first_.end() ? npos : found->second;
+  const size_t hash = IdentityHash(m);
+  auto entry = std::lower_bound(entries_.begin(), entries_.end(), Entry{hash, 0});
+  for (; entry != entries_.end() && entry->hash == hash; ++entry) {
+    if (SameMethod(m, methods_[entry->position])) return entry->position;
+  }
+  return npos;
 }

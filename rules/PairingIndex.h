@@ -42,11 +42,17 @@ class MethodIndex {
   bool Contains(const MethodInfo& m) const { return Find(m) != npos; }
 
  private:
-  struct IdentityHash {
-    size_t operator()(const MethodInfo* m) const;
+  // A record with an identity: the hash of its identity and its position.
+  struct Entry {
+    size_t hash;
+    size_t position;
+    bool operator<(const Entry& other) const {
+      return hash != other.hash ? hash < other.hash : position < other.position;
+    }
   };
-  struct IdentityEqual {
-    bool operator()(const MethodInfo* m, const MethodInfo* n) const { return SameMethod(*m, *n); }
-  };
-  std::unordered_map<const MethodInfo*, size_t, IdentityHash, IdentityEqual> first_;
+  const RecordList<MethodInfo>& methods_;
+  // Ordered by hash, then by position: the records that may be the same
+  // method as a given one are a run of equal hashes, in list order. One
+  // allocation per index, where a hash map would make one per record.
+  std::vector<Entry> entries_;
 };

@@ -5,18 +5,12 @@
 
 namespace {
 
-// Word characters are ASCII only: bytes of multi-byte UTF-8 sequences end a
-// word rather than extend it.
-bool IsWordChar(char c) {
-  return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') || c == '_';
-}
-
 bool IsSpace(char c) {
   return c == ' ' || c == '\t' || c == '\r' || c == '\n';
 }
 
 size_t WordEnd(std::string_view text, size_t pos) {
-  while (pos < text.size() && IsWordChar(text[pos])) ++pos;
+  while (pos < text.size() && IsWordCharacter(text[pos])) ++pos;
   return pos;
 }
 
@@ -57,21 +51,23 @@ int replace(std::string& text, const char* first, const char* second, const char
   }
   std::string_view with = replacement ? replacement : "";
 
-  // Walk the text word by word; a failed match moves on to the next word, a
-  // successful one resumes after the replaced span, so the scan stays linear.
+  // Jump from one occurrence of the first word to the next (most texts hold
+  // none); an occurrence counts only where a word of the text starts. A failed
+  // match moves on past that word, a successful one resumes after the replaced
+  // span, so the scan stays linear.
   std::string_view view(text);
   std::string out;
   size_t copied = 0;  // text before this position is already in `out`
   bool changed = false;
   size_t pos = 0;
-  while (pos < view.size()) {
-    if (!IsWordChar(view[pos])) {
-      ++pos;
+  while ((pos = view.find(words[0], pos)) != std::string_view::npos) {
+    if (pos > 0 && IsWordCharacter(view[pos - 1])) {
+      pos = WordEnd(view, pos + 1);
       continue;
     }
     size_t end = MatchSequence(view, pos, words, count);
     if (end == std::string_view::npos) {
-      pos = WordEnd(view, pos);
+      pos = WordEnd(view, pos + 1);
       continue;
     }
     out.append(view, copied, pos - copied);

@@ -1,6 +1,22 @@
 #pragma once
 
+#include <array>
 #include <string>
+
+// The characters that words are made of: ASCII letters, digits and "_". Bytes
+// of multi-byte UTF-8 sequences end a word rather than extend it.
+inline constexpr std::array<bool, 256> kWordCharacters = [] {
+  std::array<bool, 256> word{};
+  for (int c = 0; c < 256; ++c) {
+    word[c] =
+        (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') || c == '_';
+  }
+  return word;
+}();
+
+inline bool IsWordCharacter(char c) {
+  return kWordCharacters[static_cast<unsigned char>(c)];
+}
 
 // Replaces in `text` every occurrence of the word sequence `first` [`second`
 // [`third`]] by `replacement`. A word of the sequence matches only a whole

@@ -18,6 +18,9 @@ TEST(WordReplaceTest, MatchesWholeWordsOnly) {
             "longer my_long long2 Long");
   EXPECT_EQ(Replaced("const long& x,long*(long)", "long", nullptr, nullptr, "L", 1),
             "const L& x,L*(L)");
+  // Occurrences inside words are passed over, not the whole words after them.
+  EXPECT_EQ(Replaced("alonglong long", "long", nullptr, nullptr, "L", 1), "alonglong L");
+  EXPECT_EQ(Replaced("longlong_long,long", "long", nullptr, nullptr, "L", 1), "longlong_long,L");
   // A non-ASCII byte ends a word.
   EXPECT_EQ(Replaced("\xC3\xA9long", "long", nullptr, nullptr, "L", 1), "\xC3\xA9L");
 }

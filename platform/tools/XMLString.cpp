@@ -27,8 +27,6 @@ const char* EntityFor(char c) {
   }
 }
 
-const char kEscaped[] = "&<>\"'\t\n\r";
-
 void AppendUtf8(std::string& out, uint32_t cp) {
   if (cp < 0x80) {
     out.push_back(static_cast<char>(cp));
@@ -98,8 +96,10 @@ size_t DecodeReference(std::string_view ref, std::string& out) {
 }  // namespace
 
 int encodeXMLString(std::string_view value, std::string& rewritten) {
-  size_t pos = value.find_first_of(kEscaped);
-  if (pos == std::string_view::npos) return 0;
+  // A plain loop: find_first_of searches the set once per character.
+  size_t pos = 0;
+  while (pos < value.size() && EntityFor(value[pos]) == nullptr) ++pos;
+  if (pos == value.size()) return 0;
   std::string out(value.substr(0, pos));
   for (; pos < value.size(); ++pos) {
     const char* entity = EntityFor(value[pos]);
@@ -114,11 +114,13 @@ int encodeXMLString(std::string_view value, std::string& rewritten) {
 }
 
 int decodeXMLString(std::string_view value, std::string& rewritten) {
+  size_t amp = value.find('&');
+  if (amp == std::string_view::npos) return 0;  // nearly every value
   std::string out;
-  size_t copied = 0;  // value before this position is already in `out`
+  out.reserve(value.size());  // a reference is longer than what it stands for
+  size_t copied = 0;          // value before this position is already in `out`
   bool changed = false;
-  size_t amp;
-  for (size_t from = 0; (amp = value.find('&', from)) != std::string_view::npos;) {
+  for (size_t from = amp; (amp = value.find('&', from)) != std::string_view::npos;) {
     std::string decoded;
     size_t length = DecodeReference(value.substr(amp + 1), decoded);
     if (length == 0) {

@@ -22,7 +22,36 @@ void Remember(int& error, int err) {
   if (error == 0) error = err != 0 ? err : EIO;
 }
 
+// The log that the standard streams write to on this thread instead of their
+// files, if any.
+thread_local ZORLog* capturing = nullptr;
+
 }  // namespace
+
+ZORLogCapture::ZORLogCapture(ZORLog& log) : previous_(capturing) {
+  capturing = &log;
+}
+
+ZORLogCapture::~ZORLogCapture() {
+  capturing = previous_;
+}
+
+void ZORLog::Hold(ZOROFStream* stream, std::string_view text, bool endsLine) {
+  if (pieces_.empty() || pieces_.back().stream != stream || pieces_.back().endsLine) {
+    pieces_.push_back({stream, {}, false});
+  }
+  pieces_.back().text += text;
+  pieces_.back().endsLine = endsLine;
+}
+
+void ZORLog::Replay() {
+  for (const Piece& piece : pieces_) {
+    *piece.stream << piece.text;
+    // What endl does after its line feed, which is in the text.
+    if (piece.endsLine) piece.stream->flush();
+  }
+  pieces_.clear();
+}
 
 ZOROFStream::~ZOROFStream() {
   close();
@@ -59,6 +88,10 @@ int ZOROFStream::flush() {
 
 ZOROFStream& ZOROFStream::operator<<(std::string_view text) {
   if (file_ == nullptr || text.empty()) return *this;
+  if (!owned_ && capturing != nullptr) {
+    capturing->Hold(this, text, false);
+    return *this;
+  }
   if (std::fwrite(text.data(), 1, text.size(), file_) != text.size()) Remember(error_, errno);
   return *this;
 }
@@ -68,6 +101,10 @@ ZOROFStream& ZOROFStream::operator<<(int value) {
 }
 
 ZOROFStream& ZOROFStream::operator<<(ZOREndl) {
+  if (file_ != nullptr && !owned_ && capturing != nullptr) {
+    capturing->Hold(this, "\n", true);
+    return *this;
+  }
   *this << std::string_view("\n");
   // A standard stream is flushed line by line, so that the lines of the two
   // log streams keep their order when both go to the same place.

@@ -3,6 +3,7 @@
 #include <cstdio>
 #include <string>
 #include <string_view>
+#include <vector>
 
 // The line-end manipulator of ZOROFStream: writes "\n".
 struct ZOREndl {};
@@ -51,3 +52,39 @@ class ZOROFStream {
 // (standard error). Both are flushed before the process ends.
 extern ZOROFStream ZORout;
 extern ZOROFStream ZORerr;
+
+// Log output held back: what a thread writes to the standard log streams
+// while a ZORLogCapture of this log is alive on it. Lets work that runs on
+// several threads write its lines in the order one thread would have.
+class ZORLog {
+ public:
+  // Writes the held output to its streams, in the order it was written,
+  // flushing at each line end as the streams do, and forgets it. Call it on
+  // a thread that is not capturing.
+  void Replay();
+
+ private:
+  friend class ZOROFStream;
+  // Text for one stream, ended by a line end when `endsLine`.
+  struct Piece {
+    ZOROFStream* stream;
+    std::string text;
+    bool endsLine;
+  };
+  void Hold(ZOROFStream* stream, std::string_view text, bool endsLine);
+  std::vector<Piece> pieces_;
+};
+
+// While alive, holds back in `log` everything the calling thread writes to
+// the standard log streams (streams that own a file are not concerned).
+// Captures nest: the innermost one holds.
+class ZORLogCapture {
+ public:
+  explicit ZORLogCapture(ZORLog& log);
+  ~ZORLogCapture();
+  ZORLogCapture(const ZORLogCapture&) = delete;
+  ZORLogCapture& operator=(const ZORLogCapture&) = delete;
+
+ private:
+  ZORLog* previous_;
+};

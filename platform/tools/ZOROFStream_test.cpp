@@ -88,3 +88,45 @@ TEST_F(ZOROFStreamTest, BorrowedStreamIsFlushedButNotClosed) {
   EXPECT_EQ(Contents(path), "line\nmore");
   EXPECT_EQ(std::fclose(file), 0);
 }
+
+// Two borrowed streams appending to one file stand for the log streams going
+// to the same place: a line shows up there when it is ended.
+TEST_F(ZOROFStreamTest, CapturedLinesAreReplayedInTheirOrder) {
+  const fs::path path = dir_ / "log";
+  std::FILE* outFile = std::fopen(path.c_str(), "ab");
+  std::FILE* errFile = std::fopen(path.c_str(), "ab");
+  ASSERT_NE(outFile, nullptr);
+  ASSERT_NE(errFile, nullptr);
+  const fs::path help = dir_ / "help.htm";
+  {
+    ZOROFStream out(outFile);
+    ZOROFStream err(errFile);
+    ZOROFStream owned;
+    ASSERT_EQ(owned.open(help.c_str(), 8), 0);
+    ZORLog first;
+    ZORLog second;
+    {
+      ZORLogCapture capture(second);
+      err << "b1" << endl;
+      out << "b2 ";
+      {
+        ZORLogCapture inner(first);
+        out << "a" << 1 << endl;
+      }
+      err << "b3" << endl;
+      out << "b4" << endl;
+      owned << "not held" << endl;  // a stream that owns its file writes at once
+    }
+    EXPECT_EQ(Contents(path), "");
+    first.Replay();
+    EXPECT_EQ(Contents(path), "a1\n");
+    second.Replay();
+    second.Replay();  // nothing is left to write twice
+    EXPECT_EQ(owned.close(), 0);
+  }
+  // "b2 " waits in its stream until its line is ended, as it would have.
+  EXPECT_EQ(Contents(path), "a1\nb1\nb3\nb2 b4\n");
+  EXPECT_EQ(Contents(help), "not held\n");
+  EXPECT_EQ(std::fclose(outFile), 0);
+  EXPECT_EQ(std::fclose(errFile), 0);
+}

@@ -62,7 +62,8 @@ int WriteDirectly(const char* path, std::string_view bytes, std::string& reason)
 }
 
 // The mode a newly created document gets: 0644 less the process's umask,
-// which can only be read by setting it (the process has a single thread).
+// which can only be read by setting it (no other thread creates files while
+// a document is written).
 mode_t NewFileMode() {
   mode_t mask = ::umask(0);
   ::umask(mask);

@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <cstring>
 #include <memory>
+#include <string_view>
 #include <vector>
 
 // How a parsed document is kept in memory: its text in one buffer, parsed in
@@ -117,6 +118,17 @@ class BlockAttributes {
   bool Next(const char*& name, const char*& value) {
     const char* slot;
     return Next(name, value, slot);
+  }
+  // The same, with the lengths of name and value, which the walk measures
+  // anyway (but for a moved value).
+  bool Next(std::string_view& name, std::string_view& value, const char*& slot) {
+    while (IsBlockSeparator(*p_)) ++p_;
+    if (*p_ == '>' || *p_ == '/') return false;
+    name = std::string_view(p_);
+    const char* text;
+    p_ = ReadBlockValue(p_ + name.size(), slot, text);
+    value = *slot == kMovedValue ? std::string_view(text) : std::string_view(text, p_ - text);
+    return true;
   }
 
  private:

@@ -210,6 +210,36 @@ const char* QEXVBTXMLNode::getAttributeValue(const char* name, const void*) cons
   return nullptr;
 }
 
+void QEXVBTXMLNode::getAttributeValues(std::span<const std::string_view> names,
+                                       std::span<const char*> values) const {
+  for (size_t i = 0; i < names.size(); ++i) values[i] = nullptr;
+  // Each attribute fills the slot of its name, if asked for. Callers mostly
+  // ask in the order in which elements hold their attributes, so the search
+  // starts after the name found last.
+  size_t next = 0;
+  auto take = [&names, &values, &next](std::string_view name, const char* value) {
+    for (size_t k = 0; k < names.size(); ++k) {
+      const size_t i = next + k < names.size() ? next + k : next + k - names.size();
+      if (names[i] == name) {
+        values[i] = value;
+        next = i + 1;
+        return;
+      }
+    }
+  };
+  Extra* extra = this->extra();
+  if (extra != nullptr && extra->owned) {
+    for (const Extra::Attribute& attribute : extra->attributes)
+      take(attribute.name, attribute.value);
+    return;
+  }
+  BlockAttributes walk(block());
+  std::string_view name;
+  std::string_view value;
+  const char* slot;
+  while (walk.Next(name, value, slot)) take(name, value.data());
+}
+
 void QEXVBTXMLNode::setAttributeValue(const char* name, const char* value) {
   if (name == nullptr) return;
   SetOwnedValue(name, value != nullptr ? value : "");
@@ -391,16 +421,16 @@ void QEXVBTXMLNode::RewriteBlock(RewritePass& pass) {
   pass.grown.clear();
   pass.grown_text.clear();
   BlockAttributes walk(block());
-  const char* name;
-  const char* value;
+  std::string_view name;
+  std::string_view value;
   const char* slot;
   while (walk.Next(name, value, slot)) {
     pass.scratch.clear();
     if (pass.rewrite(value, pass.scratch) == 0) continue;
     std::string_view text = UpToZero(pass.scratch);
-    size_t room = std::strlen(value);
+    size_t room = value.size();
     if (text.size() <= room) {
-      char* place = const_cast<char*>(value);  // the document's own buffer
+      char* place = const_cast<char*>(value.data());  // the document's own buffer
       std::memcpy(place, text.data(), text.size());
       std::memset(place + text.size(), 0, room - text.size());
       continue;
@@ -409,7 +439,7 @@ void QEXVBTXMLNode::RewriteBlock(RewritePass& pass) {
         MoveValue(*pass.document, const_cast<char*>(slot), room, text)) {
       continue;
     }
-    pass.grown.push_back({name, value, pass.grown_text.size(), text.size()});
+    pass.grown.push_back({name.data(), value.data(), pass.grown_text.size(), text.size()});
     pass.grown_text += text;
   }
   if (!pass.grown.empty()) RebuildBlock(pass);

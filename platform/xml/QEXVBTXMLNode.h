@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <span>
 #include <string>
 #include <string_view>
 
@@ -56,6 +57,13 @@ class QEXVBTXMLNode {
   // pointer stays valid until the value is set again or the element is
   // discarded. The second parameter is unused.
   const char* getAttributeValue(const char* name, const void* unused = nullptr) const;
+  // Looks up several attributes in one walk over this element's attributes:
+  // values[i] is set to what getAttributeValue(names[i]) answers. Cheaper than
+  // one lookup per name when an element has several attributes to skip, the
+  // more so when `names` follow the order of the element's attributes.
+  // `names` are distinct; `values` has at least as many entries.
+  void getAttributeValues(std::span<const std::string_view> names,
+                          std::span<const char*> values) const;
   // Adds attribute `name` at the end, or replaces the value of an existing one
   // in place. Both strings are copied.
   void setAttributeValue(const char* name, const char* value);
