@@ -1,0 +1,2 @@
+# Git keeps no empty directory: make it here.
+mkdir -p ref/sub
