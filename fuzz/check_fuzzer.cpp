@@ -4,7 +4,8 @@
 // load, prepare, compare, prune and write the report, once without and once
 // with "-L". Documents that do not load must say why; a report must read back
 // as a well-formed document, and must not change when the documents are
-// prepared piecewise.
+// prepared piecewise, in two passes (normalise, then decode) instead of the
+// run's one.
 //
 // The progress log goes to /dev/null. The warning log shares standard error
 // with libFuzzer, so long runs pass -close_fd_mask=2 to silence it.
@@ -18,6 +19,7 @@
 
 #include "documents/ReportDocument.h"
 #include "documents/TypeNameNormalization.h"
+#include "driver/PairLoading.h"
 #include "platform/tools/XMLString.h"
 #include "platform/xml/QEXVBTXMLNode.h"
 #include "rules/CheckSettings.h"
@@ -39,18 +41,21 @@ std::unique_ptr<QEXVBTXMLNode> Load(std::string_view text) {
   return document;
 }
 
+// The preparation of a run.
 void Prepare(QEXVBTXMLNode& document) {
-  changeAttributeValues(&document, NormalizeTypeNames);
-  changeAttributeValues(&document, decodeXMLString);
+  changeAttributeValues(&document, PrepareValue);
 }
 
-// The same preparation, one subtree of the root at a time: a pass over part of
-// a document keeps grown values in the elements rather than in the document's
-// storage, so the rules read them by another path. The root's own values are
-// never read by the rules.
+// The same preparation in its two steps, one subtree of the root at a time: a
+// pass over part of a document keeps grown values in the elements rather than
+// in the document's storage, so the rules read them by another path. The
+// root's own values are never read by the rules.
 void PrepareByParts(QEXVBTXMLNode& document) {
   QEXVBTXMLPosition position = document.getFirstNodePosition();
-  while (QEXVBTXMLNode* child = document.getNextNode(position)) Prepare(*child);
+  while (QEXVBTXMLNode* child = document.getNextNode(position)) {
+    changeAttributeValues(child, NormalizeTypeNames);
+    changeAttributeValues(child, decodeXMLString);
+  }
 }
 
 // The report of one pair, not yet finished; the documents

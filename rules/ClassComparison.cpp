@@ -1,22 +1,17 @@
 #include "rules/ClassComparison.h"
 
-#include "platform/xml/QEXVBTXMLSearch.h"
+#include "rules/ChildElements.h"
 #include "rules/MethodComparison.h"
 #include "rules/NewPureVirtualMethods.h"
 #include "rules/PairingIndex.h"
 
 int CompareClasses(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* checked,
                    ReportMirror& report, int checkNewPureVirtual) {
-  QEXVBTXMLSearch referenceQuery;
-  referenceQuery.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "Class"});
-  referenceQuery.searchStart(reference);
-  QEXVBTXMLSearch checkedQuery;
-  checkedQuery.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "Class"});
-  checkedQuery.searchStart(checked);
-  if (referenceQuery.matches().empty()) return 0;
+  const std::vector<QEXVBTXMLNode*> referenceClasses = ChildElements(reference, "Class");
+  if (referenceClasses.empty()) return 0;
 
-  const NameIndex checkedClasses(checkedQuery.matches());
-  for (const QEXVBTXMLNode* cls : referenceQuery.matches()) {
+  const NameIndex checkedClasses(ChildElements(checked, "Class"));
+  for (const QEXVBTXMLNode* cls : referenceClasses) {
     const char* name = cls->getAttributeValue("Name");
     ReportMirror reportClass(report, "Class");
     reportClass.CopyAttribute("Name", name);

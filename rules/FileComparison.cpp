@@ -8,6 +8,7 @@
 #include "platform/tools/ZOROFStream.h"
 #include "platform/xml/QEXVBTXMLSearch.h"
 #include "rules/CheckSettings.h"
+#include "rules/ChildElements.h"
 #include "rules/ClassComparison.h"
 #include "rules/PairingIndex.h"
 #include "rules/ReportMirror.h"
@@ -78,11 +79,9 @@ int CheckLevelAndUsage(const QEXVBTXMLNode& reference, const QEXVBTXMLNode& chec
 }  // namespace
 
 bool RecentlyDeprecatedFile(const QEXVBTXMLNode& file) {
-  QEXVBTXMLSearch classes;
-  classes.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "Class"});
-  classes.searchStart(&file);
-  if (classes.matches().empty()) return false;
-  for (const QEXVBTXMLNode* cls : classes.matches()) {
+  const std::vector<QEXVBTXMLNode*> classes = ChildElements(&file, "Class");
+  if (classes.empty()) return false;
+  for (const QEXVBTXMLNode* cls : classes) {
     if (!RecentlyDeprecatedClass(*cls)) return false;
   }
   return true;

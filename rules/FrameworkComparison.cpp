@@ -8,7 +8,7 @@
 #include <vector>
 
 #include "platform/tools/ZOROFStream.h"
-#include "platform/xml/QEXVBTXMLSearch.h"
+#include "rules/ChildElements.h"
 #include "rules/FileComparison.h"
 #include "rules/PairingIndex.h"
 #include "rules/ReportMirror.h"
@@ -83,19 +83,14 @@ void CompareAll(std::vector<FrameworkPair>& pairs, QEXVBTXMLNode* report) {
 
 int CompareFrameworks(const QEXVBTXMLNode* reference, const QEXVBTXMLNode* checked,
                       QEXVBTXMLNode*& report) {
-  QEXVBTXMLSearch referenceQuery;
-  referenceQuery.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "Framework"});
-  referenceQuery.searchStart(reference);
-  QEXVBTXMLSearch checkedQuery;
-  checkedQuery.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "Framework"});
-  checkedQuery.searchStart(checked);
-  if (referenceQuery.matches().empty()) return 0;
+  const std::vector<QEXVBTXMLNode*> referenceFrameworks = ChildElements(reference, "Framework");
+  if (referenceFrameworks.empty()) return 0;
 
   // A framework without counterpart is passed over: its mirror would hold no
   // finding and never reach the report.
-  const NameIndex checkedFrameworks(checkedQuery.matches());
+  const NameIndex checkedFrameworks(ChildElements(checked, "Framework"));
   std::vector<std::pair<const QEXVBTXMLNode*, const QEXVBTXMLNode*>> found;
-  for (const QEXVBTXMLNode* framework : referenceQuery.matches()) {
+  for (const QEXVBTXMLNode* framework : referenceFrameworks) {
     const QEXVBTXMLNode* counterpart = checkedFrameworks.Find(framework->getAttributeValue("Name"));
     if (counterpart != nullptr) found.emplace_back(framework, counterpart);
   }
