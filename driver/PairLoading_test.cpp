@@ -1,12 +1,11 @@
 #include "driver/PairLoading.h"
 
 #include <gtest/gtest.h>
-#include <unistd.h>
 
-#include <cstdio>
-#include <fstream>
 #include <string>
 #include <vector>
+
+#include "tests/TempDir.h"
 
 namespace {
 
@@ -29,27 +28,13 @@ TEST(PrepareValueTest, NormalisesTypeNamesThenDecodesReferences) {
   EXPECT_EQ(Prepared("long&#32;long"), "QEXLONG32 QEXLONG32");
 }
 
-class LoadPairTest : public ::testing::Test {
- protected:
-  void SetUp() override {
-    char pattern[] = "/tmp/pair_loading_XXXXXX";
-    ASSERT_NE(mkdtemp(pattern), nullptr);
-    directory_ = pattern;
-  }
-  void TearDown() override {
-    for (const char* name : {"/ref.xml", "/chk.xml"}) std::remove((directory_ + name).c_str());
-    rmdir(directory_.c_str());
-  }
-  TAFileName Write(const char* name, const char* text) {
-    std::ofstream(directory_ + "/" + name) << text;
-    return TAFileName(directory_ + "/" + name);
-  }
-  std::string directory_;
-};
+using LoadPairTest = TempDirTest;
 
+// Documents that cannot be read or parsed are in the end-to-end cases.
 TEST_F(LoadPairTest, ReadsAndPreparesBothDocuments) {
-  LoadedPair pair = LoadPair(Write("ref.xml", R"(<W><M Type="unsigned long &amp;"/></W>)"),
-                             Write("chk.xml", R"(<W><M Type="long long"/></W>)"));
+  LoadedPair pair =
+      LoadPair(TAFileName(Write("ref.xml", R"(<W><M Type="unsigned long &amp;"/></W>)")),
+               TAFileName(Write("chk.xml", R"(<W><M Type="long long"/></W>)")));
   ASSERT_NE(pair.reference.root, nullptr);
   ASSERT_NE(pair.checked.root, nullptr);
   QEXVBTXMLPosition position = pair.reference.root->getFirstNodePosition();
@@ -59,35 +44,16 @@ TEST_F(LoadPairTest, ReadsAndPreparesBothDocuments) {
   EXPECT_STREQ(pair.checked.root->getNextNode(position)->getAttributeValue("Type"), "QEXLONG64");
 }
 
-TEST_F(LoadPairTest, ReportsEachDocumentThatCannotBeRead) {
-  TAFileName missing(directory_ + "/missing.xml");
-  LoadedPair pair = LoadPair(missing, Write("chk.xml", "<W><Unclosed></W>"));
-  EXPECT_EQ(pair.reference.root, nullptr);
-  EXPECT_EQ(pair.reference.path.str(), missing.str());
-  EXPECT_EQ(pair.reference.error.reason, "No such file or directory");
-  EXPECT_EQ(pair.reference.error.line, 0);
-  EXPECT_EQ(pair.checked.root, nullptr);
-  EXPECT_EQ(pair.checked.error.line, 1);
-}
-
-TEST_F(LoadPairTest, LoadsInTheBackground) {
-  std::future<LoadedPair> loading =
-      StartLoadingPair(Write("ref.xml", "<W/>"), Write("chk.xml", "<X/>"));
-  LoadedPair pair = loading.get();
-  ASSERT_NE(pair.checked.root, nullptr);
-  EXPECT_STREQ(pair.checked.root->getTag(), "X");
-}
-
+// Pairs are read ahead on other threads but handed out in their order.
 TEST_F(LoadPairTest, ReadsThePairsOfARunInOrder) {
   std::vector<PairReader::Paths> paths;
   for (int i = 0; i < 5; ++i) {
     const std::string name = std::to_string(i) + ".xml";
-    std::ofstream(directory_ + "/r" + name) << "<R" << i << "/>";
-    std::ofstream(directory_ + "/c" + name) << "<C" << i << "/>";
-    paths.emplace_back(TAFileName(directory_ + "/r" + name), TAFileName(directory_ + "/c" + name));
+    paths.emplace_back(TAFileName(Write("r" + name, "<R" + std::to_string(i) + "/>")),
+                       TAFileName(Write("c" + name, "<C" + std::to_string(i) + "/>")));
   }
   // A pair whose reference document is missing keeps its place.
-  paths.insert(paths.begin() + 2, {TAFileName(directory_ + "/none.xml"), paths[0].second});
+  paths.insert(paths.begin() + 2, {TAFileName(Path("none.xml")), paths[0].second});
   PairReader reader(paths);
   std::string order;
   while (reader.HasNext()) {
@@ -96,10 +62,6 @@ TEST_F(LoadPairTest, ReadsThePairsOfARunInOrder) {
     order += pair.checked.root->getTag();
   }
   EXPECT_EQ(order, "R0C0R1C1-C0R2C2R3C3R4C4");
-  for (const PairReader::Paths& pair : paths) {
-    std::remove(pair.first.c_str());
-    std::remove(pair.second.c_str());
-  }
 }
 
 }  // namespace

@@ -5,36 +5,15 @@
 #include <memory>
 #include <vector>
 
-#include "platform/xml/QEXVBTXMLSearch.h"
+// NameIndex, which pairs files and classes, is covered by the end-to-end
+// cases rules_files_pairing and rules_classes_pairing.
 
 namespace {
-
-std::unique_ptr<QEXVBTXMLNode> Parse(const char* text) {
-  XMLReadError error;
-  auto document = QEXVBTXMLNode::CreateFromText(text, error);
-  EXPECT_NE(document, nullptr) << error.reason;
-  return document;
-}
-
-TEST(NameIndexTest, FindsTheFirstElementOfANameAndNeverANamelessOne) {
-  auto document =
-      Parse(R"xml(<F><C Name="a" n="1"/><C/><C Name="b"/><C Name="a" n="2"/><C Name=""/></F>)xml");
-  QEXVBTXMLSearch query;
-  query.setSearch({QEXVBTXMLSearch::SearchChildren, QEXVBTXMLSearch::TagIs, "C"});
-  query.searchStart(document.get());
-  const NameIndex index(query.matches());
-  ASSERT_NE(index.Find("a"), nullptr);
-  EXPECT_STREQ(index.Find("a")->getAttributeValue("n"), "1");
-  EXPECT_EQ(index.Find("b"), query.matches()[2]);
-  EXPECT_EQ(index.Find(""), query.matches()[4]);
-  EXPECT_EQ(index.Find("A"), nullptr);
-  EXPECT_EQ(index.Find(nullptr), nullptr);
-}
 
 // The index must answer exactly what a scan for the first SameMethod match
 // answers, duplicates, overloads and incomplete records included.
 TEST(MethodIndexTest, AgreesWithAFirstMatchScan) {
-  auto document = Parse(R"xml(<C>
+  const char* text = R"xml(<C>
     <M Name="f" Access="Public"><Arg Type="int"/></M>
     <M Name="f" Access="Public"><Arg Type="long"/></M>
     <M Name="f" Access="Public" ReturnedType="x"><Arg Type="int"/></M>
@@ -46,7 +25,10 @@ TEST(MethodIndexTest, AgreesWithAFirstMatchScan) {
     <M Access="Public"><Arg Type="int"/></M>
     <M Name="g" Access="Public"/>
     <M Name="f" Access="Public"><Arg/></M>
-  </C>)xml");
+  </C>)xml";
+  XMLReadError error;
+  auto document = QEXVBTXMLNode::CreateFromText(text, error);
+  ASSERT_NE(document, nullptr) << error.reason;
   RecordList<MethodInfo> methods;
   QEXVBTXMLPosition position = document->getFirstNodePosition();
   while (position != nullptr) methods.push_back(BuildMethodInfo(*document->getNextNode(position)));

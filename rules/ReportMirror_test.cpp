@@ -24,18 +24,6 @@ std::string Shape(const QEXVBTXMLNode& element) {
   return shape;
 }
 
-TEST(ReportMirrorTest, CreatesNothingWithoutAFinding) {
-  auto root = QEXVBTXMLNode::CreateNode("XmlDiff");
-  ReportMirror reportRoot(root.get());
-  {
-    ReportMirror framework(reportRoot, "Framework");
-    framework.CopyAttribute("Name", "F");
-    ReportMirror file(framework, "File");
-    file.CopyAttribute("Name", "F.h");
-  }
-  EXPECT_EQ(root->getFirstNodePosition(), nullptr);
-}
-
 // The chain to a finding is created when the finding is recorded, ancestors
 // first, in the order in which the walk mirrored the elements; branches
 // without a finding never appear.

@@ -3,30 +3,19 @@
 #include <gtest/gtest.h>
 
 #include <climits>
+#include <string>
 
-TEST(SaturatingAtoiTest, ReadsLikeAtoi) {
-  EXPECT_EQ(SaturatingAtoi("18"), 18);
+// Through the level of the command line, the end-to-end cases (cli_level_*)
+// cover signs, blanks, trailing letters and overflow; ZOROFStream's test covers
+// toString.
+TEST(SaturatingAtoiTest, ReadsLikeAtoiButClampsAtThe32BitLimits) {
   EXPECT_EQ(SaturatingAtoi(" \t\n\v\f\r-42x"), -42);
-  EXPECT_EQ(SaturatingAtoi("+5"), 5);
-  EXPECT_EQ(SaturatingAtoi("2a"), 2);
-  EXPECT_EQ(SaturatingAtoi(""), 0);
-  EXPECT_EQ(SaturatingAtoi("- 5"), 0);
   EXPECT_EQ(SaturatingAtoi("+-5"), 0);
-}
-
-TEST(SaturatingAtoiTest, ClampsAtThe32BitLimits) {
   EXPECT_EQ(SaturatingAtoi("2147483647"), INT_MAX);
   EXPECT_EQ(SaturatingAtoi("2147483648"), INT_MAX);
   EXPECT_EQ(SaturatingAtoi("-2147483648"), INT_MIN);
   EXPECT_EQ(SaturatingAtoi("-2147483649"), INT_MIN);
-  EXPECT_EQ(SaturatingAtoi("99999999999"), INT_MAX);
   EXPECT_EQ(SaturatingAtoi(std::string(10000, '9').c_str()), INT_MAX);
   EXPECT_EQ(SaturatingAtoi(("-" + std::string(10000, '9')).c_str()), INT_MIN);
   EXPECT_EQ(SaturatingAtoi("000000000000012"), 12);
-}
-
-TEST(ToStringTest, WritesDecimal) {
-  EXPECT_EQ(toString(0), "0");
-  EXPECT_EQ(toString(-7), "-7");
-  EXPECT_EQ(toString(INT_MIN), "-2147483648");
 }

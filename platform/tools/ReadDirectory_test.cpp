@@ -1,26 +1,20 @@
 #include "platform/tools/ReadDirectory.h"
 
 #include <gtest/gtest.h>
-#include <unistd.h>
 
 #include <filesystem>
-#include <fstream>
+#include <string>
 #include <vector>
+
+#include "tests/TempDir.h"
 
 namespace fs = std::filesystem;
 
 namespace {
 
-class ReadDirectoryTest : public testing::Test {
+class ReadDirectoryTest : public TempDirTest {
  protected:
-  void SetUp() override {
-    std::string tmpl = (fs::temp_directory_path() / "readdirectory_XXXXXX").string();
-    ASSERT_NE(mkdtemp(tmpl.data()), nullptr);
-    dir_ = tmpl;
-  }
-  void TearDown() override { fs::remove_all(dir_); }
-  void Touch(const std::string& name) { std::ofstream(dir_ / name) << "x"; }
-
+  // The paths listed for `pattern`, and ReadDirectory's answer checked.
   std::vector<std::string> List(const TAFileName& pattern, int expected_result = 0) {
     QEXListValTAFileName files;
     EXPECT_EQ(ReadDirectory(pattern, files), expected_result);
@@ -28,15 +22,13 @@ class ReadDirectoryTest : public testing::Test {
     for (int i = 1; i <= files.Size(); ++i) paths.push_back(files[i].str());
     return paths;
   }
-
-  fs::path dir_;
 };
 
 }  // namespace
 
 TEST_F(ReadDirectoryTest, ListsRegularFilesSortedByByteWiseName) {
   for (const char* name : {"b.xml", "B.xml", "a.xml", "_x", ".hidden", "a b.xml", "\xC3\xA9.xml"})
-    Touch(name);
+    Write(name, "x");
   const std::string d = dir_.string();
   EXPECT_EQ(List(TAFileName(d) + "*"),
             (std::vector<std::string>{d + "/.hidden", d + "/B.xml", d + "/_x", d + "/a b.xml",
@@ -46,29 +38,18 @@ TEST_F(ReadDirectoryTest, ListsRegularFilesSortedByByteWiseName) {
 }
 
 TEST_F(ReadDirectoryTest, SkipsDirectoriesAndFollowsLinks) {
-  Touch("real.xml");
+  Write("real.xml", "x");
   fs::create_directory(dir_ / "sub");
-  std::ofstream(dir_ / "sub" / "inner.xml") << "x";
+  Write("sub/inner.xml", "x");
   fs::create_symlink(dir_ / "real.xml", dir_ / "link.xml");
   fs::create_symlink(dir_ / "sub", dir_ / "link_dir");
   fs::create_symlink(dir_ / "gone", dir_ / "dangling.xml");
-  const std::string d = dir_.string();
-  EXPECT_EQ(List(TAFileName(d) + "*"),
-            (std::vector<std::string>{d + "/link.xml", d + "/real.xml"}));
+  EXPECT_EQ(List(TAFileName(dir_.string()) + "*"),
+            (std::vector<std::string>{Path("link.xml"), Path("real.xml")}));
 }
 
 TEST_F(ReadDirectoryTest, EmptyAndUnreadableDirectories) {
   EXPECT_TRUE(List(TAFileName(dir_.string()) + "*").empty());
-  EXPECT_TRUE(List(TAFileName((dir_ / "missing").string()) + "*", 1).empty());
-  Touch("plain");
-  EXPECT_TRUE(List(TAFileName((dir_ / "plain").string()) + "*", 1).empty());
-}
-
-TEST_F(ReadDirectoryTest, StarAloneListsTheCurrentDirectory) {
-  Touch("f");
-  const fs::path previous = fs::current_path();
-  fs::current_path(dir_);
-  std::vector<std::string> listed = List(TAFileName("") + "*");
-  fs::current_path(previous);
-  EXPECT_EQ(listed, std::vector<std::string>{"f"});
+  EXPECT_TRUE(List(TAFileName(Path("missing")) + "*", 1).empty());
+  EXPECT_TRUE(List(TAFileName(Write("plain", "x")) + "*", 1).empty());
 }
