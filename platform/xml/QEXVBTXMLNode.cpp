@@ -349,15 +349,13 @@ QEXVBTXMLNode* QEXVBTXMLNode::getNextNode(QEXVBTXMLPosition& position, const voi
   return node;
 }
 
-void changeAttributeValues(QEXVBTXMLNode* root, QEXAttributeRewrite rewrite) {
-  if (root == nullptr || rewrite == nullptr) return;
-  QEXVBTXMLNode::RewritePass pass{rewrite, nullptr, {}, {}, {}};
-  if (root->OwnsDocument()) pass.document = root->extra()->document.get();
-  // Document order without recursion: `open` holds the ancestors of `node`.
-  std::vector<QEXVBTXMLNode*> open;
-  QEXVBTXMLNode* node = root;
+template <typename Node, typename Enter, typename Leave>
+void QEXVBTXMLNode::WalkInDocumentOrder(Node* root, Enter enter, Leave leave) {
+  // `open` holds the ancestors of `node` below `root`, and `root` itself.
+  std::vector<Node*> open;
+  Node* node = root;
   for (;;) {
-    node->RewriteValues(pass);
+    enter(node, open.size());
     if (node->first_child_ != nullptr) {
       open.push_back(node);
       node = node->first_child_;
@@ -371,8 +369,18 @@ void changeAttributeValues(QEXVBTXMLNode* root, QEXAttributeRewrite rewrite) {
       }
       node = open.back();
       open.pop_back();
+      leave(node, open.size());
     }
   }
+}
+
+void changeAttributeValues(QEXVBTXMLNode* root, QEXAttributeRewrite rewrite) {
+  if (root == nullptr || rewrite == nullptr) return;
+  QEXVBTXMLNode::RewritePass pass{rewrite, nullptr, {}, {}, {}};
+  if (root->OwnsDocument()) pass.document = root->extra()->document.get();
+  QEXVBTXMLNode::WalkInDocumentOrder(
+      root, [&pass](QEXVBTXMLNode* node, size_t) { node->RewriteValues(pass); },
+      [](QEXVBTXMLNode*, size_t) {});
 }
 
 void QEXVBTXMLNode::RewriteValues(RewritePass& pass) {
@@ -514,34 +522,19 @@ void QEXVBTXMLNode::AppendStartTag(std::string& out) const {
 
 void QEXVBTXMLNode::writeTo(std::string& out) const {
   out += "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n";
-  // Document order without recursion: `open` holds the elements whose end
-  // tag is still to be written.
-  std::vector<const QEXVBTXMLNode*> open;
-  const QEXVBTXMLNode* node = this;
-  for (;;) {
-    out.append(open.size() * 2, ' ');
-    node->AppendStartTag(out);
-    if (node->first_child_ != nullptr) {
-      out += ">\n";
-      open.push_back(node);
-      node = node->first_child_;
-      continue;
-    }
-    out += "/>\n";
-    for (;;) {
-      if (open.empty()) return;
-      if (node->next() != nullptr) {
-        node = node->next();
-        break;
-      }
-      node = open.back();
-      open.pop_back();
-      out.append(open.size() * 2, ' ');
-      out += "</";
-      out += node->block();
-      out += ">\n";
-    }
-  }
+  WalkInDocumentOrder(
+      this,
+      [&out](const QEXVBTXMLNode* node, size_t depth) {
+        out.append(depth * 2, ' ');
+        node->AppendStartTag(out);
+        out += node->first_child_ != nullptr ? ">\n" : "/>\n";
+      },
+      [&out](const QEXVBTXMLNode* node, size_t depth) {
+        out.append(depth * 2, ' ');
+        out += "</";
+        out += node->block();
+        out += ">\n";
+      });
 }
 
 int QEXVBTXMLNode::writeInFile(const char* path, std::string& error) const {

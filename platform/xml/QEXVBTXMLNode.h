@@ -139,6 +139,12 @@ class QEXVBTXMLNode {
   Extra& OwnedAttributes();
   void SetOwnedValue(const char* name, std::string_view value);
   void RewriteValues(RewritePass& pass);
+  // Calls enter(node, depth) on `root` (depth 0) and on each of its
+  // descendants in document order, and leave(node, depth) on each element
+  // that has children once they have all been visited. Iterative, whatever
+  // the depth; the siblings of `root` are not visited.
+  template <typename Node, typename Enter, typename Leave>
+  static void WalkInDocumentOrder(Node* root, Enter enter, Leave leave);
   void RewriteBlock(RewritePass& pass);
   void RebuildBlock(RewritePass& pass);
   void AppendStartTag(std::string& out) const;
