@@ -7,7 +7,8 @@
 #   expected.stdout    standard output (empty when absent)
 #   expected.stderr    standard error (empty when absent)
 #   expected.report.xml  when present, compared with the file out.xml
-#   expected.help.htm    when present, compared with the file help.htm
+#   expected.help.htm    when present, compared with the file help.htm (the cases
+#                        that write the help page link to ../../expected.help.htm)
 #   setup.sh           when present, run (with bash) in the working copy first
 #   run_as             when present, a user name: run as root, the program runs
 #                      as that user, since file modes do not bind root
@@ -22,7 +23,8 @@ case_dir=$2
 
 work=$(mktemp -d)
 trap 'chmod -R u+rwX "$work" 2>/dev/null; rm -rf "$work"' EXIT
-cp -R "$case_dir/." "$work/"
+# Links are followed, so that cases can share one expected file (the help page).
+cp -RL "$case_dir/." "$work/"
 cd "$work" || exit 1
 [ -f setup.sh ] && { bash setup.sh || { echo "setup.sh failed"; exit 1; }; }
 
