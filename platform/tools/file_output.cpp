@@ -1,0 +1,81 @@
+#include "platform/tools/file_output.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstring>
+#include <random>
+
+#include "platform/tools/file_descriptor.h"
+
+namespace zor2 {
+namespace {
+
+bool Fail(std::string* err, int error_number) {
+  *err = std::strerror(error_number);
+  return false;
+}
+
+bool WriteAll(int fd, std::string_view bytes) {
+  while (!bytes.empty()) {
+    ssize_t written = ::write(fd, bytes.data(), bytes.size());
+    if (written < 0) {
+      if (errno == EINTR) continue;
+      return false;
+    }
+    bytes.remove_prefix(static_cast<size_t>(written));
+  }
+  return true;
+}
+
+bool WriteDirectly(const std::string& path, std::string_view bytes, std::string* err) {
+  FileDescriptor file(
+      ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NOCTTY | O_CLOEXEC, 0666));
+  if (!file.valid()) return Fail(err, errno);
+  if (!WriteAll(file.get(), bytes)) return Fail(err, errno);
+  if (!file.Close()) return Fail(err, errno);
+  return true;
+}
+
+// Creates a new file named `path` followed by a random suffix, with `mode`
+// (less the umask); sets `temporary` to its name.
+FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string* temporary) {
+  static constexpr char kLetters[] = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789";
+  std::random_device seed;
+  std::minstd_rand random(seed());
+  for (int attempt = 0; attempt < 100; ++attempt) {
+    *temporary = path + ".tmp";
+    for (int i = 0; i < 6; ++i) *temporary += kLetters[random() % (sizeof kLetters - 1)];
+    FileDescriptor file(
+        ::open(temporary->c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOCTTY | O_CLOEXEC, mode));
+    if (file.valid() || errno != EEXIST) return file;
+  }
+  errno = EEXIST;
+  return FileDescriptor(-1);
+}
+
+}  // namespace
+
+bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::string* err) {
+  struct stat status;
+  const bool exists = ::lstat(path.c_str(), &status) == 0;
+  if (exists && !S_ISREG(status.st_mode)) return WriteDirectly(path, bytes, err);
+
+  std::string temporary;
+  FileDescriptor file = CreateTemporary(path, 0644, &temporary);
+  if (!file.valid()) return Fail(err, errno);
+  // A replaced file keeps its mode; the mode is a courtesy, so a file system
+  // that refuses it does not fail the write.
+  if (exists) (void)::fchmod(file.get(), status.st_mode & 07777);
+  int error = 0;
+  if (!WriteAll(file.get(), bytes)) error = errno;
+  if (!file.Close() && error == 0) error = errno;
+  if (error == 0 && ::rename(temporary.c_str(), path.c_str()) != 0) error = errno;
+  if (error == 0) return true;
+  ::unlink(temporary.c_str());
+  return Fail(err, error);
+}
+
+}  // namespace zor2

@@ -1,0 +1,17 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+namespace zor2 {
+
+// Writes `bytes` to the file at `path` so that the file is never left
+// half-written: a regular file, or a path that does not exist yet, is written
+// to a new temporary file in the same directory, which is then renamed over it
+// (a replaced file keeps its permission bits; a new one gets 0644 less the
+// umask). A path that exists and is not a regular file (a symbolic link, a
+// device, a pipe) is opened and written directly. False with the system's
+// reason in `err` when any step fails; the temporary file is then removed.
+bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::string* err);
+
+}  // namespace zor2
