@@ -1,11 +1,10 @@
 // libFuzzer target: one input is a reference document and a checked document
 // separated by the line "=====" (without it, the input is compared with
 // itself). Each input goes through what a run does with a document pair:
-// load, prepare, compare, prune and write the report, once without and once
-// with "-L". Documents that do not load must say why; a report must read back
-// as a well-formed document, and must not change when the documents are
-// prepared piecewise, in two passes (normalise, then decode) instead of the
-// run's one.
+// read, prepare, compare and write the report, once without and once with
+// "-L". Documents that do not read must say why; a report must read back as a
+// well-formed document, and must not change when the documents are prepared
+// in two passes (normalise, then decode) instead of the run's one.
 //
 // The progress log goes to /dev/null. The warning log shares standard error
 // with libFuzzer, so long runs pass -close_fd_mask=2 to silence it.
@@ -17,15 +16,17 @@
 #include <string>
 #include <string_view>
 
-#include "documents/ReportDocument.h"
-#include "documents/TypeNameNormalization.h"
-#include "driver/PairLoading.h"
-#include "platform/tools/XMLString.h"
-#include "platform/xml/QEXVBTXMLNode.h"
-#include "rules/CheckSettings.h"
-#include "rules/FrameworkComparison.h"
+#include "documents/type_name_normalization.h"
+#include "driver/pair_loading.h"
+#include "platform/tools/log.h"
+#include "platform/tools/xml_escaping.h"
+#include "platform/xml/output_element.h"
+#include "platform/xml/reader.h"
+#include "rules/framework_comparison.h"
 
 namespace {
+
+using namespace zor2;
 
 constexpr std::string_view kSeparator = "\n=====\n";
 
@@ -34,69 +35,49 @@ void Require(bool condition) {
   if (!condition) std::abort();
 }
 
-std::unique_ptr<QEXVBTXMLNode> Load(std::string_view text) {
-  XMLReadError error;
-  std::unique_ptr<QEXVBTXMLNode> document = QEXVBTXMLNode::CreateFromText(text, error);
-  if (!document) Require(!error.reason.empty() && error.line >= 0 && error.column >= 0);
+std::unique_ptr<xml::Document> Read(std::string_view text) {
+  std::unique_ptr<xml::Document> document;
+  xml::ReadError err;
+  if (!xml::ReadDocumentText(text, &document, &err)) {
+    Require(document == nullptr && !err.reason.empty() && err.line >= 0 && err.column >= 0);
+  }
   return document;
 }
 
 // The preparation of a run.
-void Prepare(QEXVBTXMLNode& document) {
-  changeAttributeValues(&document, PrepareValue);
+void Prepare(xml::Document& document) {
+  document.RewriteValues(PrepareValue);
 }
 
-// The same preparation in its two steps, one subtree of the root at a time: a
-// pass over part of a document keeps grown values in the elements rather than
-// in the document's storage, so the rules read them by another path. The
-// root's own values are never read by the rules.
-void PrepareByParts(QEXVBTXMLNode& document) {
-  QEXVBTXMLPosition position = document.getFirstNodePosition();
-  while (QEXVBTXMLNode* child = document.getNextNode(position)) {
-    changeAttributeValues(child, NormalizeTypeNames);
-    changeAttributeValues(child, decodeXMLString);
-  }
+// The same preparation in its two steps.
+void PrepareInTwoSteps(xml::Document& document) {
+  document.RewriteValues(NormalizeTypeNames);
+  document.RewriteValues(DecodeXmlReferences);
 }
 
-// The report of one pair, not yet finished; the documents
-// are read anew because preparing them rewrites their values.
-std::unique_ptr<QEXVBTXMLNode> Compare(std::string_view reference_text,
-                                       std::string_view checked_text,
-                                       void (*prepare)(QEXVBTXMLNode&)) {
-  std::unique_ptr<QEXVBTXMLNode> reference = Load(reference_text);
-  std::unique_ptr<QEXVBTXMLNode> checked = Load(checked_text);
-  std::unique_ptr<QEXVBTXMLNode> report = QEXVBTXMLNode::CreateNode("XmlDiff");
+// The written report of one pair; the documents are read anew because
+// preparing them rewrites their values.
+std::string Compare(std::string_view reference_text, std::string_view checked_text,
+                    const CheckSettings& settings, void (*prepare)(xml::Document&)) {
+  std::unique_ptr<xml::Document> reference = Read(reference_text);
+  std::unique_ptr<xml::Document> checked = Read(checked_text);
+  xml::OutputElement report("XmlDiff");
   if (reference && checked) {
     prepare(*reference);
     prepare(*checked);
-    QEXVBTXMLNode* root = report.get();
-    CompareFrameworks(reference.get(), checked.get(), root);
+    CompareFrameworks(reference->root(), checked->root(), settings, report, Log::Standard());
   }
-  return report;
-}
-
-std::string Written(const QEXVBTXMLNode& report) {
-  std::string text;
-  report.writeTo(text);
-  return text;
+  std::string written;
+  xml::AppendDocument(report, &written);
+  return written;
 }
 
 // One run over the pair with the given settings.
-void CheckPair(std::string_view reference_text, std::string_view checked_text, int flagged,
-               int level) {
-  OnlyFlaggedFiles = flagged;
-  CurrentLevel = level;
-  std::unique_ptr<QEXVBTXMLNode> report = Compare(reference_text, checked_text, Prepare);
-  // /dev/null is written in place, so no temporary file is ever left.
-  std::string reason;
-  Require(FinishReport(*report, "/dev/null", reason) == 0);
-  const std::string written = Written(*report);
-  XMLReadError error;
-  Require(QEXVBTXMLNode::CreateFromText(written, error) != nullptr);
-
-  std::unique_ptr<QEXVBTXMLNode> by_parts = Compare(reference_text, checked_text, PrepareByParts);
-  Require(FinishReport(*by_parts, "/dev/null", reason) == 0);
-  Require(Written(*by_parts) == written);
+void CheckPair(std::string_view reference_text, std::string_view checked_text,
+               const CheckSettings& settings) {
+  const std::string written = Compare(reference_text, checked_text, settings, Prepare);
+  Require(Read(written) != nullptr);
+  Require(Compare(reference_text, checked_text, settings, PrepareInTwoSteps) == written);
 }
 
 }  // namespace
@@ -114,9 +95,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     reference = input.substr(0, at);
     checked = input.substr(at + kSeparator.size());
   }
-  CheckPair(reference, checked, 0, 99);
-  CheckPair(reference, checked, 1, 20);
-  OnlyFlaggedFiles = 0;
-  CurrentLevel = 99;
+  CheckPair(reference, checked, CheckSettings{false, 99});
+  CheckPair(reference, checked, CheckSettings{true, 20});
   return 0;
 }

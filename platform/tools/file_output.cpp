@@ -30,19 +30,11 @@ bool WriteAll(int fd, std::string_view bytes) {
   return true;
 }
 
-bool WriteDirectly(const std::string& path, std::string_view bytes, std::string* err) {
-  FileDescriptor file(
-      ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NOCTTY | O_CLOEXEC, 0666));
-  if (!file.valid()) return Fail(err, errno);
-  if (!WriteAll(file.get(), bytes)) return Fail(err, errno);
-  if (!file.Close()) return Fail(err, errno);
-  return true;
-}
-
 // Creates a new file named `path` followed by a random suffix, with `mode`
 // (less the umask); sets `temporary` to its name.
 FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string* temporary) {
-  static constexpr char kLetters[] = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789";
+  static constexpr char kLetters[] =
+      "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789";
   std::random_device seed;
   std::minstd_rand random(seed());
   for (int attempt = 0; attempt < 100; ++attempt) {
@@ -61,7 +53,8 @@ FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string
 bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::string* err) {
   struct stat status;
   const bool exists = ::lstat(path.c_str(), &status) == 0;
-  if (exists && !S_ISREG(status.st_mode)) return WriteDirectly(path, bytes, err);
+  bool opened;
+  if (exists && !S_ISREG(status.st_mode)) return WriteFileInPlace(path, bytes, &opened, err);
 
   std::string temporary;
   FileDescriptor file = CreateTemporary(path, 0644, &temporary);
@@ -76,6 +69,17 @@ bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::s
   if (error == 0) return true;
   ::unlink(temporary.c_str());
   return Fail(err, error);
+}
+
+bool WriteFileInPlace(const std::string& path, std::string_view bytes, bool* opened,
+                      std::string* err) {
+  FileDescriptor file(
+      ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NOCTTY | O_CLOEXEC, 0666));
+  *opened = file.valid();
+  if (!file.valid()) return Fail(err, errno);
+  if (!WriteAll(file.get(), bytes)) return Fail(err, errno);
+  if (!file.Close()) return Fail(err, errno);
+  return true;
 }
 
 }  // namespace zor2

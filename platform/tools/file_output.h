@@ -14,4 +14,10 @@ namespace zor2 {
 // reason in `err` when any step fails; the temporary file is then removed.
 bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::string* err);
 
+// Writes `bytes` to the file at `path`, created or truncated, in place. False
+// with the system's reason in `err` when it cannot; `*opened` then tells
+// whether the file could be opened at all.
+bool WriteFileInPlace(const std::string& path, std::string_view bytes, bool* opened,
+                      std::string* err);
+
 }  // namespace zor2

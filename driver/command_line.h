@@ -1,0 +1,30 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "driver/exit_status.h"
+#include "rules/check_settings.h"
+
+namespace zor2 {
+
+// What a run is asked to do, as read from the command line.
+struct RunConfiguration {
+  std::string reference_path;                 // "-r": a document or a directory of documents
+  std::string checked_path;                   // "-c": likewise
+  std::string output_path;                    // "-o": the report
+  std::optional<std::string> help_page_path;  // "-htm"
+  CheckSettings settings;                     // "-L" and "-level"
+};
+
+// Reads the program's arguments (`argv[0]` is the program name; `argv` holds
+// `argc` entries), or the items of the argument file named by the two
+// arguments "=" and a path. Usage errors go to standard error, the "-h" text
+// to standard output. When the run may go on, fills `config`, writes the
+// banner and the level to the standard log and returns nothing; otherwise
+// returns the status the process must end with (a usage error, an unreadable
+// argument file, or "-h").
+std::optional<ExitStatus> ReadCommandLine(int argc, const char* const* argv,
+                                          RunConfiguration* config);
+
+}  // namespace zor2

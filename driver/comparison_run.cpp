@@ -1,0 +1,206 @@
+// Thread model. The main thread runs the whole program and is the only one
+// that writes the report, the help page and the standard log. Other threads
+// only ever read documents and fill what they were handed:
+// - pair loading (PairReader, LoadPair) reads and prepares the two documents
+//   of a pair on two threads, and in directory mode the next small pairs while
+//   the current one is compared; each load owns the document it makes;
+// - the framework comparison (CompareFrameworks) compares framework pairs on
+//   the main thread and one helper, each pair into a report branch and a log
+//   of its own, which the main thread appends to the report and replays into
+//   the standard log in reference order;
+// - the documents of a compared pair are freed on a thread of their own.
+// So the report and every log line are the same, byte for byte, as a
+// single-threaded run's. Should a thread not start, its work runs on the main
+// thread instead.
+
+#include "driver/comparison_run.h"
+
+#include <sys/stat.h>
+
+#include <cerrno>
+#include <cstring>
+#include <future>
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "documents/help_page.h"
+#include "driver/pair_loading.h"
+#include "platform/tools/background.h"
+#include "platform/tools/file_output.h"
+#include "platform/tools/log.h"
+#include "platform/tools/paths.h"
+#include "platform/xml/output_element.h"
+#include "rules/framework_comparison.h"
+
+namespace zor2 {
+namespace {
+
+enum class InputMode { kFilePair, kDirectoryPair, kUnusable };
+
+InputMode ChooseInputMode(const std::string& reference, const std::string& checked) {
+  if (IsRegularFile(reference) && IsRegularFile(checked)) return InputMode::kFilePair;
+  if (IsDirectory(reference) && IsDirectory(checked)) return InputMode::kDirectoryPair;
+  return InputMode::kUnusable;
+}
+
+// One pass over the inputs: the shared report and whether anything failed.
+class ComparisonRun {
+ public:
+  explicit ComparisonRun(const RunConfiguration& config)
+      : config_(config), report_("XmlDiff"), log_(Log::Standard()) {}
+
+  ExitStatus Run() {
+    CompareInputs();
+    WriteReport();
+    WriteHelpPage();
+    if (discarding_.valid()) discarding_.get();
+    return incomplete_ ? ExitStatus::kIncomplete : ExitStatus::kDone;
+  }
+
+ private:
+  // Names `path` and why it failed in an "ERROR: " line; the run's result is
+  // then incomplete. Every failure of a run is reported here.
+  void ReportFailure(const std::string& path, const std::string& reason) {
+    log_.Warning() << "ERROR: " << path << ": " << reason;
+    incomplete_ = true;
+  }
+
+  void CompareInputs() {
+    switch (ChooseInputMode(config_.reference_path, config_.checked_path)) {
+      case InputMode::kFilePair:
+        ComparePair(LoadPair(config_.reference_path, config_.checked_path));
+        return;
+      case InputMode::kDirectoryPair:
+        CompareDirectories();
+        return;
+      case InputMode::kUnusable:
+        log_.Progress() << " Pb with input (-r or -c) ";
+        ReportUnusableInputs();
+        incomplete_ = true;
+        return;
+    }
+  }
+
+  // Names `path` when it is neither a file nor a directory; returns whether it
+  // is one of them.
+  bool CheckInputKind(const std::string& path) {
+    struct stat status;
+    if (::stat(path.c_str(), &status) != 0) {
+      ReportFailure(path, std::strerror(errno));
+      return false;
+    }
+    if (S_ISREG(status.st_mode) || S_ISDIR(status.st_mode)) return true;
+    ReportFailure(path, "Not a regular file or directory");
+    return false;
+  }
+
+  // Says which input path makes the pair unusable, so that the user need not
+  // guess from the progress line alone.
+  void ReportUnusableInputs() {
+    const std::string& reference = config_.reference_path;
+    const std::string& checked = config_.checked_path;
+    const bool reference_known = CheckInputKind(reference);
+    const bool checked_known = CheckInputKind(checked);
+    if (!reference_known || !checked_known) return;
+    if (IsDirectory(checked)) {
+      ReportFailure(checked, "Is a directory, but the reference " + reference + " is a file");
+    } else {
+      ReportFailure(checked, "Not a directory, but the reference " + reference + " is a directory");
+    }
+  }
+
+  // Pairs each reference document with the checked document of the same name;
+  // a reference document without one is passed over silently.
+  void CompareDirectories() {
+    std::vector<std::string> entries;
+    std::string err;
+    if (!ListRegularFiles(config_.reference_path, &entries, &err)) {
+      ReportFailure(config_.reference_path, "cannot list the directory");
+      return;
+    }
+    std::vector<PairReader::Paths> pairs;
+    for (std::string& entry : entries) {
+      std::string checked = JoinPath(config_.checked_path, BaseName(entry));
+      if (IsRegularFile(checked)) pairs.push_back({std::move(entry), std::move(checked)});
+    }
+    PairReader reader(std::move(pairs));
+    while (reader.HasNext()) ComparePair(reader.Next());
+  }
+
+  // Both documents are read even when the first fails, so that every fault
+  // is reported in one run, the reference document's first.
+  void ComparePair(LoadedPair pair) {
+    ReportLoadFault(pair.reference);
+    ReportLoadFault(pair.checked);
+    if (pair.reference.document && pair.checked.document) {
+      CompareFrameworks(pair.reference.document->root(), pair.checked.document->root(),
+                        config_.settings, report_, log_);
+    }
+    Discard(std::move(pair));
+  }
+
+  // Giving the memory of large documents back to the system takes a while, so
+  // it is done on another thread while the run goes on. The report holds
+  // copies of the values it mirrors, never pointers into the documents.
+  void Discard(LoadedPair pair) {
+    if (discarding_.valid()) discarding_.get();
+    // The pair is moved into the task's body, so that it is freed there.
+    discarding_ = RunInBackground(
+        [pair = std::move(pair)]() mutable { LoadedPair discarded = std::move(pair); });
+  }
+
+  void ReportLoadFault(const LoadedDocument& loaded) {
+    if (loaded.document) return;
+    const xml::ReadError& error = loaded.error;
+    if (error.line > 0) {
+      ReportFailure(
+          loaded.path + ":" + std::to_string(error.line) + ":" + std::to_string(error.column),
+          error.reason);
+    } else {
+      ReportFailure(loaded.path, error.reason);
+    }
+  }
+
+  void WriteReport() {
+    std::string err;
+    if (!xml::WriteDocument(report_, config_.output_path, &err)) {
+      ReportFailure(config_.output_path, err);
+    }
+  }
+
+  void WriteHelpPage() {
+    if (!config_.help_page_path) return;
+    const std::string& path = *config_.help_page_path;
+    bool opened = false;
+    std::string err;
+    if (WriteFileInPlace(path, HelpPageText(), &opened, &err)) return;
+    if (opened) {
+      ReportFailure(path, err);
+    } else {
+      log_.Warning() << "Unable to open file " << path;
+      incomplete_ = true;
+    }
+  }
+
+  const RunConfiguration& config_;
+  xml::OutputElement report_;
+  Log& log_;
+  bool incomplete_ = false;
+  std::future<void> discarding_;  // frees the documents of the last pair
+};
+
+}  // namespace
+
+ExitStatus RunComparison(const RunConfiguration& config) {
+  return ComparisonRun(config).Run();
+}
+
+ExitStatus RunProgram(int argc, const char* const* argv) {
+  RunConfiguration config;
+  std::optional<ExitStatus> ended = ReadCommandLine(argc, argv, &config);
+  return ended ? *ended : RunComparison(config);
+}
+
+}  // namespace zor2

@@ -1,0 +1,76 @@
+#include "driver/pair_loading.h"
+
+#include <filesystem>
+#include <system_error>
+
+#include "documents/type_name_normalization.h"
+#include "platform/tools/background.h"
+#include "platform/tools/xml_escaping.h"
+#include "platform/xml/reader.h"
+
+namespace zor2 {
+namespace {
+
+// Touches nothing but its own document, so that loads can run at once.
+LoadedDocument LoadDocument(const std::string& path) {
+  LoadedDocument loaded{path, nullptr, {}};
+  if (xml::ReadDocumentFile(path, &loaded.document, &loaded.error)) {
+    loaded.document->RewriteValues(PrepareValue);
+  }
+  return loaded;
+}
+
+// The size of the two files of a pair; a file that cannot be measured counts
+// for nothing (its load will say why).
+uintmax_t PairBytes(const PairReader::Paths& paths) {
+  std::error_code error;
+  uintmax_t bytes = 0;
+  for (const std::string* path : {&paths.reference, &paths.checked}) {
+    const uintmax_t size = std::filesystem::file_size(*path, error);
+    if (!error) bytes += size;
+  }
+  return bytes;
+}
+
+}  // namespace
+
+// Both steps in one pass give each value what one pass over the document per
+// step would give it, at half the walks.
+bool PrepareValue(std::string_view value, std::string* rewritten) {
+  std::string normalized;
+  if (!NormalizeTypeNames(value, &normalized)) return DecodeXmlReferences(value, rewritten);
+  if (!DecodeXmlReferences(normalized, rewritten)) *rewritten = std::move(normalized);
+  return true;
+}
+
+LoadedPair LoadPair(const std::string& reference, const std::string& checked) {
+  std::future<LoadedDocument> checked_load =
+      RunInBackground([checked] { return LoadDocument(checked); });
+  LoadedDocument reference_document = LoadDocument(reference);
+  return {std::move(reference_document), checked_load.get()};
+}
+
+LoadedPair PairReader::Next() {
+  if (ahead_.empty()) Start();
+  Loading loading = std::move(ahead_.front());
+  ahead_.pop_front();
+  bytes_ahead_ -= loading.bytes;
+  ++taken_;
+  LoadedPair pair = loading.pair.get();
+  while (started_ < pairs_.size() && ahead_.size() < kPairsAhead &&
+         bytes_ahead_ + PairBytes(pairs_[started_]) <= kReadAheadBytes) {
+    Start();
+  }
+  return pair;
+}
+
+void PairReader::Start() {
+  const Paths& paths = pairs_[started_++];
+  const uintmax_t bytes = PairBytes(paths);
+  // The paths are copied into the task, which may outlive this reader's.
+  ahead_.push_back(
+      {RunInBackground([paths] { return LoadPair(paths.reference, paths.checked); }), bytes});
+  bytes_ahead_ += bytes;
+}
+
+}  // namespace zor2

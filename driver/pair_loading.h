@@ -1,0 +1,86 @@
+#pragma once
+
+#include <cstdint>
+#include <deque>
+#include <future>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+#include "platform/xml/document.h"
+#include "platform/xml/read_error.h"
+
+namespace zor2 {
+
+// Reading the documents of a pair and preparing them for the rules. The two
+// documents of a pair are independent, so each is read on a thread of its
+// own; nothing here writes to a log, so that the caller reports faults in its
+// own fixed order.
+
+// A document read and prepared, or the reason why it could not be read.
+struct LoadedDocument {
+  std::string path;
+  std::unique_ptr<xml::Document> document;  // null when it could not be read
+  xml::ReadError error;                     // why, when document is null
+};
+
+// The two documents of a pair.
+struct LoadedPair {
+  LoadedDocument reference;
+  LoadedDocument checked;
+};
+
+// Prepares one attribute value of an input document for the rules, as a value
+// rewrite (xml::ValueRewrite): type names are normalised before entity
+// references are decoded, so that the normalisation only ever sees the text
+// as written in the document.
+bool PrepareValue(std::string_view value, std::string* rewritten);
+
+// Reads the documents at `reference` and `checked`, each on its own thread,
+// and prepares every attribute value of each. Returns when both are done; a
+// document that cannot be read comes back without document.
+LoadedPair LoadPair(const std::string& reference, const std::string& checked);
+
+// The document pairs of a run, loaded in order, the next ones ahead while the
+// caller compares the current one: with small pairs, comparing one pair on one
+// core would leave the other core idle. Pairs are read ahead only up to
+// kPairsAhead of them and kReadAheadBytes of files; a large pair keeps both
+// cores busy on its own (LoadPair, CompareFrameworks) and is read when its
+// turn comes, so that large documents are held one pair at a time.
+//
+// Thread safety: used by one thread; the loading runs on threads of its own.
+class PairReader {
+ public:
+  struct Paths {
+    std::string reference;
+    std::string checked;
+  };
+  static constexpr size_t kPairsAhead = 2;
+  static constexpr uintmax_t kReadAheadBytes = uintmax_t{16} << 20;
+
+  explicit PairReader(std::vector<Paths> pairs) : pairs_(std::move(pairs)) {}
+  PairReader(const PairReader&) = delete;
+  PairReader& operator=(const PairReader&) = delete;
+
+  bool HasNext() const { return taken_ < pairs_.size(); }
+  // The next pair, once loaded; the pairs after it are then read ahead.
+  // REQUIRES: HasNext().
+  LoadedPair Next();
+
+ private:
+  struct Loading {
+    std::future<LoadedPair> pair;
+    uintmax_t bytes;
+  };
+  void Start();
+
+  std::vector<Paths> pairs_;
+  size_t taken_ = 0;    // pairs handed out
+  size_t started_ = 0;  // pairs whose loading has started
+  std::deque<Loading> ahead_;
+  uintmax_t bytes_ahead_ = 0;
+};
+
+}  // namespace zor2

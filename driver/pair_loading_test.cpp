@@ -1,0 +1,66 @@
+#include "driver/pair_loading.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+#include "tests/test_util.h"
+
+namespace zor2 {
+namespace {
+
+// The prepared value, or "<unchanged>" when PrepareValue answers false.
+std::string Prepared(std::string_view value) {
+  std::string out = "<unchanged>";
+  const bool changed = PrepareValue(value, &out);
+  EXPECT_EQ(changed, out != "<unchanged>") << value;
+  return out;
+}
+
+TEST(PrepareValueTest, NormalisesTypeNamesThenDecodesReferences) {
+  EXPECT_EQ(Prepared("int"), "<unchanged>");
+  EXPECT_EQ(Prepared("unsigned long"), "QEXULONG32");
+  EXPECT_EQ(Prepared("a &amp; b"), "a & b");
+  EXPECT_EQ(Prepared("const unsigned long long &amp;"), "const QEXULONG64 &");
+  EXPECT_EQ(Prepared("f(long a, long  long b)"), "f(QEXLONG32 a, QEXLONG64 b)");
+  // Decoding comes second: a name spelled with a reference is not normalised.
+  EXPECT_EQ(Prepared("&#108;ong"), "long");
+  EXPECT_EQ(Prepared("long&#32;long"), "QEXLONG32 QEXLONG32");
+}
+
+using LoadPairTest = testing::TempDirTest;
+
+// Documents that cannot be read or parsed are in the end-to-end cases.
+TEST_F(LoadPairTest, ReadsAndPreparesBothDocuments) {
+  LoadedPair pair = LoadPair(Write("ref.xml", R"(<W><M Type="unsigned long &amp;"/></W>)"),
+                             Write("chk.xml", R"(<W><M Type="long long"/></W>)"));
+  ASSERT_NE(pair.reference.document, nullptr);
+  ASSERT_NE(pair.checked.document, nullptr);
+  EXPECT_STREQ(pair.reference.document->root().first_child()->FindAttribute("Type"),
+               "QEXULONG32 &");
+  EXPECT_STREQ(pair.checked.document->root().first_child()->FindAttribute("Type"), "QEXLONG64");
+}
+
+// Pairs are read ahead on other threads but handed out in their order.
+TEST_F(LoadPairTest, ReadsThePairsOfARunInOrder) {
+  std::vector<PairReader::Paths> paths;
+  for (int i = 0; i < 5; ++i) {
+    const std::string name = std::to_string(i) + ".xml";
+    paths.push_back({Write("r" + name, "<R" + std::to_string(i) + "/>"),
+                     Write("c" + name, "<C" + std::to_string(i) + "/>")});
+  }
+  // A pair whose reference document is missing keeps its place.
+  paths.insert(paths.begin() + 2, {Path("none.xml"), paths[0].checked});
+  PairReader reader(paths);
+  std::string order;
+  while (reader.HasNext()) {
+    LoadedPair pair = reader.Next();
+    order += pair.reference.document ? pair.reference.document->root().tag() : "-";
+    order += pair.checked.document->root().tag();
+  }
+  EXPECT_EQ(order, "R0C0R1C1-C0R2C2R3C3R4C4");
+}
+
+}  // namespace
+}  // namespace zor2

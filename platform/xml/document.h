@@ -1,0 +1,88 @@
+#pragma once
+
+#include <cstddef>
+#include <span>
+#include <string>
+#include <string_view>
+#include <utility>
+
+#include "platform/xml/document_storage.h"
+
+namespace zor2::xml {
+
+class Parser;
+
+// An element of a parsed document: a tag, attributes and child elements, all
+// read-only. Elements live in their document's memory and point into its text
+// (see document_storage.h); they are valid as long as their document.
+class Element {
+ public:
+  Element(const Element&) = delete;
+  Element& operator=(const Element&) = delete;
+
+  const char* tag() const { return block_; }
+  const Element* first_child() const { return first_child_; }
+  const Element* next_sibling() const { return next_; }
+
+  // The value of attribute `name`, or null when the element has none.
+  const char* FindAttribute(const char* name) const { return FindBlockValue(block_, name); }
+  // Looks up several attributes in one walk over this element's attributes:
+  // values[i] is set to what FindAttribute(names[i]) answers. Quickest when
+  // `names` follow the order in which the element holds its attributes.
+  // REQUIRES: `names` are distinct; `values` has at least as many entries.
+  void FindAttributes(std::span<const std::string_view> names, std::span<const char*> values) const;
+
+ private:
+  friend class Document;
+  friend class Parser;
+  explicit Element(const char* block) : block_(block) {}
+
+  // The tag, followed by the attributes (document_storage.h).
+  const char* block_;
+  Element* next_ = nullptr;
+  Element* first_child_ = nullptr;
+};
+
+// A rewrite of one attribute value: when `value` changes, fills `rewritten`
+// and returns true; otherwise returns false and leaves `rewritten` alone.
+// Values are zero-terminated: a rewritten text ends at its first zero byte.
+using ValueRewrite = bool (*)(std::string_view value, std::string* rewritten);
+
+// A parsed XML document (read with ReadDocumentFile or ReadDocumentText): its
+// text in one buffer, parsed in place, and its elements.
+class Document {
+ public:
+  // Only the reader makes documents.
+  class ReaderKey {
+    friend class Parser;
+    ReaderKey() = default;
+  };
+  Document(ReaderKey, TextBuffer text) : text_(std::move(text)) {}
+  Document(const Document&) = delete;
+  Document& operator=(const Document&) = delete;
+
+  const Element& root() const { return *root_; }
+
+  // Applies `rewrite` to every attribute value of every element; a rewritten
+  // value replaces the old one. Values read before may be changed in place.
+  void RewriteValues(ValueRewrite rewrite);
+
+ private:
+  friend class Parser;
+  struct RewritePass;
+  Element* NewElement(const char* block);
+  // `size` bytes of the text's spare capacity, or null when it is used up.
+  // Pages of a large buffer that are never used cost no memory.
+  char* AllocateSpare(size_t size);
+  void RewriteElement(Element& element, RewritePass& pass);
+  bool MoveValue(char* slot, size_t room, std::string_view text);
+  void RebuildBlock(Element& element, RewritePass& pass);
+
+  TextBuffer text_;        // the document as UTF-8
+  size_t spare_used_ = 0;  // of the capacity after the text's sentinel
+  Arena elements_;
+  Arena blocks_;  // attribute blocks rebuilt for values that grew
+  Element* root_ = nullptr;
+};
+
+}  // namespace zor2::xml

@@ -1,0 +1,457 @@
+#include "platform/xml/reader.h"
+
+#include <fcntl.h>
+#include <strings.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <array>
+#include <cerrno>
+#include <cstring>
+#include <string>
+#include <unordered_set>
+#include <vector>
+
+#include "platform/tools/file_descriptor.h"
+#include "platform/xml/text_encoding.h"
+
+namespace zor2::xml {
+namespace {
+
+enum CharacterClass : unsigned char { kSpace = 1, kNameStart = 2, kNameChar = 4 };
+
+// XML names, with "@" allowed anywhere; every byte of a multi-byte UTF-8
+// character counts as a name character.
+constexpr std::array<unsigned char, 256> kClasses = [] {
+  std::array<unsigned char, 256> classes{};
+  for (int c = 0; c < 256; ++c) {
+    bool start = (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == '_' || c == ':' ||
+                 c == '@' || c >= 0x80;
+    bool name = start || (c >= '0' && c <= '9') || c == '-' || c == '.';
+    bool space = c == ' ' || c == '\t' || c == '\n' || c == '\r';
+    classes[c] = (space ? kSpace : 0) | (start ? kNameStart : 0) | (name ? kNameChar : 0);
+  }
+  return classes;
+}();
+
+inline bool Is(char c, CharacterClass kind) {
+  return (kClasses[static_cast<unsigned char>(c)] & kind) != 0;
+}
+
+inline char* SkipSpace(char* p) {
+  while (Is(*p, kSpace)) ++p;
+  return p;
+}
+
+inline char* SkipName(char* p) {
+  while (Is(*p, kNameChar)) ++p;
+  return p;
+}
+
+// Where the scan of an attribute value stops: at its closing quote, at "<"
+// (not allowed in a value) and at a zero byte (the end sentinel, or a zero in
+// the text).
+template <char kQuote>
+constexpr std::array<bool, 256> kValueStops = [] {
+  std::array<bool, 256> stops{};
+  stops[static_cast<unsigned char>(kQuote)] = stops['<'] = stops[0] = true;
+  return stops;
+}();
+
+template <char kQuote>
+char* ScanValue(char* p) {
+  const std::array<bool, 256>& stops = kValueStops<kQuote>;
+  for (;; p += 4) {
+    if (stops[static_cast<unsigned char>(p[0])]) return p;
+    if (stops[static_cast<unsigned char>(p[1])]) return p + 1;
+    if (stops[static_cast<unsigned char>(p[2])]) return p + 2;
+    if (stops[static_cast<unsigned char>(p[3])]) return p + 3;
+  }
+}
+
+bool HasPrefix(const char* p, const char* end, std::string_view prefix) {
+  return static_cast<size_t>(end - p) >= prefix.size() &&
+         std::memcmp(p, prefix.data(), prefix.size()) == 0;
+}
+
+char* Find(char* from, char* end, std::string_view text) {
+  return static_cast<char*>(memmem(from, end - from, text.data(), text.size()));
+}
+
+// Up to this many attributes, an element's names are compared pairwise; past
+// it a hash set keeps the duplicate check linear.
+constexpr size_t kPairwiseLimit = 16;
+
+}  // namespace
+
+// One pass over a document's text. The parser writes into the text only
+// inside start tags (see document_storage.h), and never moves a byte other than
+// the tag's, so a position keeps its line and column; the only line feeds it
+// overwrites (after an attribute name) are remembered in hidden_newlines_.
+class Parser {
+ public:
+  // Parses `text` into a new document.
+  static bool Read(TextBuffer text, std::unique_ptr<Document>* document, ReadError* err) {
+    size_t start = 0;
+    if (!ConvertToUtf8(&text, &start, err)) return false;
+    auto parsed = std::make_unique<Document>(Document::ReaderKey(), std::move(text));
+    if (!Parser(*parsed, start).Run(err)) return false;
+    *document = std::move(parsed);
+    return true;
+  }
+
+ private:
+  Parser(Document& document, size_t start)
+      : document_(document),
+        begin_(document.text_.data() + start),
+        end_(document.text_.data() + document.text_.size) {}
+
+  bool Run(ReadError* err) {
+    if (ParseDocument()) return true;
+    err->reason = std::move(reason_);
+    LocateInText(begin_, fault_, hidden_newlines_, &err->line, &err->column);
+    return false;
+  }
+
+  bool ParseDocument();
+  bool ParseMarkup(char* lt);
+  bool ParseStartTag(char* lt);
+  bool ParseAttribute();
+  bool RememberAttributeName(std::string_view name);
+  bool ParseEndTag(char* lt);
+  bool ParseDeclaration(char* lt);
+  bool SkipDoctype(char* lt);
+  char* SkipInternalSubset(char* p);
+  char* SkipQuoted(char* p);
+  bool ParseProcessingInstruction(char* lt);
+
+  bool Fail(const char* at, std::string reason) {
+    fault_ = at;
+    reason_ = std::move(reason);
+    return false;
+  }
+  // A fault at `at`, which may be the end of the text.
+  bool Expected(const char* at, const std::string& what) {
+    return Fail(at, (at == end_ ? "unexpected end of document, expected " : "expected ") + what);
+  }
+
+  Document& document_;
+  char* const begin_;
+  char* const end_;  // *end_ is the zero sentinel
+  char* p_ = nullptr;
+  // An element whose end tag is to come.
+  struct Open {
+    Element* element;
+    Element* last_child;
+  };
+  std::vector<Open> open_;
+  bool root_seen_ = false;
+  bool root_closed_ = false;
+  bool doctype_seen_ = false;
+  std::vector<std::string_view> attribute_names_;
+  std::unordered_set<std::string_view> attribute_set_;
+  bool attribute_set_used_ = false;
+  std::vector<size_t> hidden_newlines_;
+  const char* fault_ = nullptr;
+  std::string reason_;
+};
+
+bool Parser::ParseDocument() {
+  p_ = begin_;
+  for (;;) {
+    char* p = SkipSpace(p_);
+    char* lt = p;
+    if (*p != '<') {
+      if (open_.empty()) {
+        if (p == end_) break;
+        return Fail(p,
+                    root_closed_ ? "text after the root element" : "text before the root element");
+      }
+      // Text content is skipped, not examined.
+      lt = static_cast<char*>(std::memchr(p, '<', end_ - p));
+      if (lt == nullptr) break;
+    }
+    if (!ParseMarkup(lt)) return false;
+  }
+  if (!open_.empty()) {
+    return Fail(end_, "unexpected end of document, element <" +
+                          std::string(open_.back().element->tag()) + "> is not closed");
+  }
+  if (!root_seen_) return Fail(end_, begin_ == end_ ? "empty document" : "no root element");
+  return true;
+}
+
+bool Parser::ParseMarkup(char* lt) {
+  switch (lt[1]) {
+    case '/':
+      return ParseEndTag(lt);
+    case '!':
+      return ParseDeclaration(lt);
+    case '?':
+      return ParseProcessingInstruction(lt);
+    default:
+      return ParseStartTag(lt);
+  }
+}
+
+bool Parser::ParseStartTag(char* lt) {
+  if (root_closed_) return Fail(lt, "more than one root element");
+  char* name = lt + 1;
+  if (!Is(*name, kNameStart)) return Expected(name, "an element name after '<'");
+  char* name_end = SkipName(name + 1);
+  // The tag moves one byte left, over the "<", so that its zero terminator
+  // does not overwrite the character after it.
+  size_t length = name_end - name;
+  std::memmove(lt, name, length);
+  lt[length] = '\0';
+  Element* element = document_.NewElement(lt);
+  if (!root_seen_) {
+    root_seen_ = true;
+    document_.root_ = element;
+  } else {
+    Open& parent = open_.back();
+    if (parent.last_child != nullptr) {
+      parent.last_child->next_ = element;
+    } else {
+      parent.element->first_child_ = element;
+    }
+    parent.last_child = element;
+  }
+
+  attribute_names_.clear();
+  if (attribute_set_used_) {
+    attribute_set_ = {};  // a fresh set: clearing a large one costs its buckets
+    attribute_set_used_ = false;
+  }
+  p_ = name_end;
+  for (;;) {
+    char* space = p_;
+    p_ = SkipSpace(p_);
+    if (*p_ == '>') {
+      ++p_;
+      open_.push_back({element, nullptr});
+      return true;
+    }
+    if (*p_ == '/') {
+      if (p_[1] != '>') return Expected(p_ + 1, "'>' after '/'");
+      p_ += 2;
+      if (open_.empty()) root_closed_ = true;
+      return true;
+    }
+    if (!Is(*p_, kNameStart)) {
+      return Expected(p_, "an attribute name, '>' or '/>' in start tag <" + std::string(lt) + ">");
+    }
+    if (p_ == space) return Fail(p_, "white space expected before an attribute name");
+    if (!ParseAttribute()) return false;
+  }
+}
+
+bool Parser::ParseAttribute() {
+  char* name = p_;
+  char* name_end = SkipName(name + 1);
+  std::string_view name_text(name, name_end - name);
+  char* p = SkipSpace(name_end);
+  if (*p != '=') return Expected(p, "'=' after attribute name \"" + std::string(name_text) + "\"");
+  p = SkipSpace(p + 1);
+  char quote = *p;
+  if (quote != '"' && quote != '\'') return Expected(p, "a quoted attribute value");
+  char* value = p + 1;
+  char* close = quote == '"' ? ScanValue<'"'>(value) : ScanValue<'\''>(value);
+  if (*close != quote) {
+    if (*close == '<') return Fail(close, "'<' is not allowed in an attribute value");
+    return Expected(close, "the closing quote of the attribute value");
+  }
+  if (!RememberAttributeName(name_text)) {
+    return Fail(name, "duplicate attribute \"" + std::string(name_text) + "\"");
+  }
+  if (*name_end == '\n') hidden_newlines_.push_back(name_end - begin_);
+  *name_end = '\0';
+  *close = '\0';
+  p_ = close + 1;
+  return true;
+}
+
+bool Parser::RememberAttributeName(std::string_view name) {
+  if (attribute_set_used_) return attribute_set_.insert(name).second;
+  for (std::string_view seen : attribute_names_) {
+    // Names of one element mostly differ in length or first character.
+    if (seen.size() == name.size() && seen[0] == name[0] &&
+        std::memcmp(seen.data(), name.data(), name.size()) == 0) {
+      return false;
+    }
+  }
+  attribute_names_.push_back(name);
+  if (attribute_names_.size() > kPairwiseLimit) {
+    attribute_set_.insert(attribute_names_.begin(), attribute_names_.end());
+    attribute_set_used_ = true;
+  }
+  return true;
+}
+
+bool Parser::ParseEndTag(char* lt) {
+  char* name = lt + 2;
+  if (open_.empty()) {
+    return Fail(lt,
+                root_closed_ ? "end tag after the root element" : "end tag without a start tag");
+  }
+  const char* tag = open_.back().element->tag();
+  const char* expected = tag;
+  char* p = name;
+  while (*expected != '\0' && *expected == *p) {
+    ++expected;
+    ++p;
+  }
+  if (*expected != '\0' || Is(*p, kNameChar)) {
+    char* found_end = SkipName(name);
+    if (found_end == end_) return Expected(end_, "end tag </" + std::string(tag) + ">");
+    return Fail(name, "end tag </" + std::string(name, found_end) + "> does not match start tag <" +
+                          std::string(tag) + ">");
+  }
+  p = SkipSpace(p);
+  if (*p != '>') return Expected(p, "'>' to close end tag </" + std::string(tag) + ">");
+  p_ = p + 1;
+  open_.pop_back();
+  if (open_.empty()) root_closed_ = true;
+  return true;
+}
+
+// "<!": a comment, a CDATA section or the DOCTYPE declaration, all skipped.
+bool Parser::ParseDeclaration(char* lt) {
+  char* p = lt + 2;
+  if (HasPrefix(p, end_, "--")) {
+    char* close = Find(p + 2, end_, "-->");
+    if (close == nullptr) return Fail(lt, "comment is not closed");
+    p_ = close + 3;
+    return true;
+  }
+  if (HasPrefix(p, end_, "[CDATA[")) {
+    if (open_.empty()) return Fail(lt, "CDATA section outside the root element");
+    char* close = Find(p + 7, end_, "]]>");
+    if (close == nullptr) return Fail(lt, "CDATA section is not closed");
+    p_ = close + 3;
+    return true;
+  }
+  if (HasPrefix(p, end_, "DOCTYPE") && Is(p[7], kSpace)) return SkipDoctype(lt);
+  return Expected(p, "a comment, a CDATA section or DOCTYPE after '<!'");
+}
+
+// The DOCTYPE is skipped whole, internal subset included: the entities it
+// declares are never expanded.
+bool Parser::SkipDoctype(char* lt) {
+  if (root_seen_) return Fail(lt, "DOCTYPE after the root element");
+  if (doctype_seen_) return Fail(lt, "more than one DOCTYPE");
+  char* p = lt + 9;
+  while (*p != '>') {
+    if (p == end_) return Fail(lt, "DOCTYPE is not closed");
+    if (*p == '"' || *p == '\'') {
+      p = SkipQuoted(p);
+    } else if (*p == '[') {
+      p = SkipInternalSubset(p + 1);
+    } else {
+      ++p;
+    }
+    if (p == nullptr) return Fail(lt, "DOCTYPE is not closed");
+  }
+  doctype_seen_ = true;
+  p_ = p + 1;
+  return true;
+}
+
+// Returns the position after the "]" that closes the subset, or null.
+char* Parser::SkipInternalSubset(char* p) {
+  while (p != nullptr && *p != ']') {
+    if (p == end_) return nullptr;
+    if (*p == '"' || *p == '\'') {
+      p = SkipQuoted(p);
+    } else if (HasPrefix(p, end_, "<!--")) {
+      char* close = Find(p + 4, end_, "-->");
+      p = close != nullptr ? close + 3 : nullptr;
+    } else if (HasPrefix(p, end_, "<?")) {
+      char* close = Find(p + 2, end_, "?>");
+      p = close != nullptr ? close + 2 : nullptr;
+    } else {
+      ++p;
+    }
+  }
+  return p != nullptr ? p + 1 : nullptr;
+}
+
+// Returns the position after the quote that closes the literal at `p`, or
+// null.
+char* Parser::SkipQuoted(char* p) {
+  void* close = std::memchr(p + 1, *p, end_ - p - 1);
+  return close != nullptr ? static_cast<char*>(close) + 1 : nullptr;
+}
+
+bool Parser::ParseProcessingInstruction(char* lt) {
+  char* target = lt + 2;
+  if (!Is(*target, kNameStart)) return Expected(target, "a processing instruction target");
+  char* target_end = SkipName(target + 1);
+  if (target_end - target == 3 && strncasecmp(target, "xml", 3) == 0 && lt != begin_) {
+    return Fail(lt, "XML declaration not at the start of the document");
+  }
+  char* close = Find(target_end, end_, "?>");
+  if (close == nullptr) return Fail(lt, "processing instruction is not closed");
+  p_ = close + 2;
+  return true;
+}
+
+namespace {
+
+bool Refuse(ReadError* err, int error_number) {
+  err->reason = std::strerror(error_number);
+  return false;
+}
+
+// Reads the file at `path` in one piece into `text`, with spare capacity
+// after it for values that preparation makes longer.
+bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
+  FileDescriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC));
+  if (!file.valid()) return Refuse(err, errno);
+  struct stat status;
+  if (::fstat(file.get(), &status) != 0) return Refuse(err, errno);
+  if (S_ISDIR(status.st_mode)) return Refuse(err, EISDIR);
+  // One byte more than a regular file's size, so that its end is seen
+  // without growing the buffer.
+  size_t limit = S_ISREG(status.st_mode) ? static_cast<size_t>(status.st_size) + 1 : 65536;
+  TextBuffer buffer = TextBuffer::Allocate(limit, limit / 4);
+  size_t length = 0;
+  for (;;) {
+    if (length == limit) {
+      limit *= 2;
+      TextBuffer larger = TextBuffer::Allocate(limit, limit / 4);
+      std::memcpy(larger.data(), buffer.data(), length);
+      buffer = std::move(larger);
+    }
+    ssize_t got = ::read(file.get(), buffer.data() + length, limit - length);
+    if (got < 0) {
+      if (errno == EINTR) continue;
+      return Refuse(err, errno);
+    }
+    if (got == 0) break;
+    length += static_cast<size_t>(got);
+  }
+  buffer.size = length;
+  buffer.bytes[length] = '\0';
+  *text = std::move(buffer);
+  return true;
+}
+
+}  // namespace
+
+bool ReadDocumentFile(const std::string& path, std::unique_ptr<Document>* document,
+                      ReadError* err) {
+  *err = ReadError{};
+  TextBuffer text;
+  if (!ReadWholeFile(path, &text, err)) return false;
+  return Parser::Read(std::move(text), document, err);
+}
+
+bool ReadDocumentText(std::string_view text, std::unique_ptr<Document>* document, ReadError* err) {
+  *err = ReadError{};
+  TextBuffer copy = TextBuffer::Allocate(text.size(), text.size() / 4);
+  if (!text.empty()) std::memcpy(copy.data(), text.data(), text.size());
+  return Parser::Read(std::move(copy), document, err);
+}
+
+}  // namespace zor2::xml

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <memory>
+#include <string>
+#include <string_view>
+
+#include "platform/xml/document.h"
+#include "platform/xml/read_error.h"
+
+namespace zor2::xml {
+
+// Reading XML documents.
+//
+// The reader is our own because interface documents carry attribute names
+// that begin with "@" ("@ZOR2Level", "@ZOR2Usage", "@nodoc"), which are not
+// XML names, so that standard XML parsers reject the documents. It reads XML
+// names in which "@" may also stand, first character included, and checks the
+// rest of the structure as XML does. It is built for large documents: the text
+// is read in one piece and parsed in place, with memchr-style scans, and it
+// never recurses over the input. Attribute values are handed over raw, entity
+// references not decoded; DOCTYPE declarations, comments, processing
+// instructions, CDATA sections and text are skipped, and entities are never
+// expanded. Documents in UTF-16 or UTF-32 with a byte-order mark, or in an
+// encoding their XML declaration names, are converted to UTF-8 first.
+
+// Reads the document at `path` into `document`. False with `err` filled when
+// the file cannot be read (the system's reason, line and column 0) or is not
+// well-formed (the first fault, with its line and column).
+bool ReadDocumentFile(const std::string& path, std::unique_ptr<Document>* document, ReadError* err);
+
+// Reads a document held in memory (copied first); same contract.
+bool ReadDocumentText(std::string_view text, std::unique_ptr<Document>* document, ReadError* err);
+
+}  // namespace zor2::xml

@@ -1,0 +1,90 @@
+#include "rules/framework_comparison.h"
+
+#include <atomic>
+#include <memory>
+#include <vector>
+
+#include "platform/tools/background.h"
+#include "rules/child_elements.h"
+#include "rules/file_comparison.h"
+#include "rules/pairing_index.h"
+#include "rules/report_mirror.h"
+
+namespace zor2 {
+namespace {
+
+// One framework pair, compared apart from the report and the run's log so
+// that pairs can be compared on two threads: the mirror of the reference
+// framework (created only when it holds a finding) and the pair's log lines
+// wait here until the pairs before them are in.
+struct FrameworkPair {
+  const xml::Element* reference = nullptr;
+  const xml::Element* checked = nullptr;
+  std::unique_ptr<xml::OutputElement> mirror;
+  Log log;
+  std::atomic<bool> done{false};  // set by the thread that compared it, last
+};
+
+void ComparePair(FrameworkPair& pair, const CheckSettings& settings) {
+  const char* name = pair.reference->FindAttribute("Name");
+  ReportMirror report_framework(&pair.mirror, "Framework");
+  report_framework.CopyAttribute("Name", name);
+  pair.log.Progress() << "Checking : " << name;
+  CompareInterfaceFiles(*pair.reference, *pair.checked, "Public", settings, report_framework,
+                        pair.log);
+  CompareInterfaceFiles(*pair.reference, *pair.checked, "Protected", settings, report_framework,
+                        pair.log);
+  pair.done.store(true, std::memory_order_release);
+}
+
+// Hands the pairs from `committed` on to the report and the log, in reference
+// order, as far as they are done, so that the result is that of comparing one
+// pair after the other while progress lines come as soon as they can. Only the
+// thread that called CompareFrameworks commits.
+void CommitDone(std::vector<FrameworkPair>& pairs, size_t& committed, xml::OutputElement& report,
+                Log& log) {
+  for (; committed < pairs.size() && pairs[committed].done.load(std::memory_order_acquire);
+       ++committed) {
+    FrameworkPair& pair = pairs[committed];
+    pair.log.ReplayInto(log);
+    if (pair.mirror != nullptr) report.AddChild(std::move(pair.mirror));
+  }
+}
+
+}  // namespace
+
+void CompareFrameworks(const xml::Element& reference, const xml::Element& checked,
+                       const CheckSettings& settings, xml::OutputElement& report, Log& log) {
+  const NameIndex checked_frameworks(ChildElements(checked, "Framework"));
+  std::vector<const xml::Element*> references;
+  std::vector<const xml::Element*> counterparts;
+  for (const xml::Element* framework : ChildElements(reference, "Framework")) {
+    const xml::Element* counterpart = checked_frameworks.Find(framework->FindAttribute("Name"));
+    if (counterpart == nullptr) continue;
+    references.push_back(framework);
+    counterparts.push_back(counterpart);
+  }
+  std::vector<FrameworkPair> pairs(references.size());
+  for (size_t i = 0; i < pairs.size(); ++i) {
+    pairs[i].reference = references[i];
+    pairs[i].checked = counterparts[i];
+  }
+
+  // Each thread takes the next pair not yet taken; the pairs only read the
+  // documents, which are shared.
+  std::atomic<size_t> next{0};
+  auto work = [&pairs, &next, &settings] {
+    for (size_t i; (i = next++) < pairs.size();) ComparePair(pairs[i], settings);
+  };
+  std::future<void> helper;
+  if (pairs.size() > 1) helper = RunInBackground(work);
+  size_t committed = 0;
+  for (size_t i; (i = next++) < pairs.size();) {
+    ComparePair(pairs[i], settings);
+    CommitDone(pairs, committed, report, log);
+  }
+  if (helper.valid()) helper.get();
+  CommitDone(pairs, committed, report, log);
+}
+
+}  // namespace zor2

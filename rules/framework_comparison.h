@@ -1,0 +1,20 @@
+#pragma once
+
+#include "platform/tools/log.h"
+#include "platform/xml/document.h"
+#include "platform/xml/output_element.h"
+#include "rules/check_settings.h"
+
+namespace zor2 {
+
+// Compares the frameworks of one document pair: pairs reference and checked
+// "Framework" elements by name and, for each pair, compares the "Public" and
+// then the "Protected" interface groups, recording the findings under
+// `report`, each under the mirrors of the reference elements that lead to it.
+// A reference framework without counterpart is passed over. The framework
+// pairs are compared on two threads when there are several; the report and
+// the lines written to `log` come out in reference order all the same.
+void CompareFrameworks(const xml::Element& reference, const xml::Element& checked,
+                       const CheckSettings& settings, xml::OutputElement& report, Log& log);
+
+}  // namespace zor2

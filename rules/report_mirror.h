@@ -1,0 +1,67 @@
+#pragma once
+
+#include <array>
+#include <cstddef>
+#include <memory>
+
+#include "platform/xml/output_element.h"
+#include "rules/message_types.h"
+#include "rules/method_records.h"
+
+namespace zor2 {
+
+// The mirror, in the report, of a reference element that the walk compares.
+// The report element is created only when a finding is recorded under it or
+// under one of its mirrored descendants, and its pending ancestors are created
+// first. The walk runs depth first, so elements are appended in the order in
+// which the walk mirrored them, and the report holds exactly the branches that
+// lead to a finding: a comparison without findings costs no report element.
+class ReportMirror {
+ public:
+  // An existing report element, such as the report root.
+  explicit ReportMirror(xml::OutputElement* element) : element_(element) {}
+  // A pending element `tag` (a literal) to go under `parent`, which must
+  // outlive this mirror.
+  ReportMirror(ReportMirror& parent, const char* tag) : parent_(&parent), tag_(tag) {}
+  // A pending element `tag` that is created into `*holder` instead of under a
+  // parent, for the caller to hand to the report later. `holder` must outlive
+  // this mirror.
+  ReportMirror(std::unique_ptr<xml::OutputElement>* holder, const char* tag)
+      : holder_(holder), tag_(tag) {}
+  ReportMirror(const ReportMirror&) = delete;
+  ReportMirror& operator=(const ReportMirror&) = delete;
+
+  // Gives the element attribute `name` with a copy of `value`; does nothing
+  // when `value` is null, so an absent attribute stays absent.
+  // REQUIRES: until the element is created both strings stay valid (document
+  // values and literals do); a pending element takes at most four attributes
+  // (a "File" has the most).
+  void CopyAttribute(const char* name, const char* value);
+
+  // The report element, created now with its pending ancestors if it does
+  // not exist yet.
+  xml::OutputElement* Element();
+
+ private:
+  struct Attribute {
+    const char* name;
+    const char* value;
+  };
+  static constexpr size_t kMaxPendingAttributes = 4;
+
+  ReportMirror* parent_ = nullptr;
+  std::unique_ptr<xml::OutputElement>* holder_ = nullptr;
+  const char* tag_ = nullptr;
+  xml::OutputElement* element_ = nullptr;
+  std::array<Attribute, kMaxPendingAttributes> pending_{};
+  size_t pending_count_ = 0;
+};
+
+// Records a finding of type `code` under `parent`: an "Error" element with
+// "ID", "FullName" and "Help", appended as its last child.
+void AddError(ReportMirror& parent, MessageCode code);
+
+// Gives a "Method" mirror the "Name" and then the "Signature" of `method`.
+void MirrorMethod(ReportMirror& report_method, const MethodRecord& method);
+
+}  // namespace zor2
