@@ -6,10 +6,14 @@
 set -euo pipefail
 cd "$(dirname "$0")/.."
 
+# CI treats warnings as errors.
+werror=()
+[ -n "${CI:-}" ] && werror=(-DZOR2_WERROR=ON)
+
 if [ "${1:-}" = "--fuzz" ]; then
   bash scripts/setup.sh --fuzz
   cmake -S . -B build-fuzz -DCMAKE_CXX_COMPILER=clang++ -DCMAKE_BUILD_TYPE=RelWithDebInfo \
-    -DZOR2_FUZZ=ON -DBUILD_TESTING=OFF >/dev/null
+    -DZOR2_FUZZ=ON -DBUILD_TESTING=OFF "${werror[@]}" >/dev/null
   cmake --build build-fuzz -j "$(nproc)" --target check_fuzzer
   # -close_fd_mask=2 keeps the checker's warnings out of libFuzzer's output.
   build-fuzz/check_fuzzer -close_fd_mask=2 fuzz/corpus/*
@@ -25,6 +29,6 @@ if [ "${1:-}" = "--sanitize" ]; then
   cmake_args=(-DCMAKE_BUILD_TYPE=Debug -DZOR2_SANITIZE=ON)
 fi
 
-cmake -S . -B "$build_dir" "${cmake_args[@]}" >/dev/null
+cmake -S . -B "$build_dir" "${cmake_args[@]}" "${werror[@]}" >/dev/null
 cmake --build "$build_dir" -j "$(nproc)"
 ctest --test-dir "$build_dir" --output-on-failure -j "$(nproc)"
