@@ -7,17 +7,20 @@
 // findings; a few more changes (type spellings that normalise to the same name) lead to none.
 //
 //   generate_workspace --reference DIR --checked DIR [--seed N] [--size MB]
-//                      [--layout single|directory] [--shape workspace|class|file|group]
+//                      [--layout single|directory]
+//                      [--shape workspace|class|file|group|overloads]
 //                      [--count N] [--change-rate R]
 //
 // Layout "single" writes DIR/Workspace.xml on each side; "directory" writes one document per
 // framework, DIR/<framework>.xml. The shapes other than "workspace" write the inputs of the growth
-// runs and ignore --size: one class of N methods, one file of N classes, one group of N files.
+// runs and ignore --size: one class of N methods, one file of N classes, one group of N files, one
+// class of N overloads of one name that differ only in their argument's type.
 
 #include <algorithm>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <deque>
 #include <cstring>
 #include <filesystem>
 #include <random>
@@ -35,7 +38,7 @@ using std::string_view_literals::operator""sv;
 // Options
 
 enum class Layout { kSingle, kDirectory };
-enum class Shape { kWorkspace, kClass, kFile, kGroup };
+enum class Shape { kWorkspace, kClass, kFile, kGroup, kOverloads };
 
 struct Options {
   uint64_t seed = 1;
@@ -50,7 +53,8 @@ struct Options {
 
 constexpr char kUsage[] =
     "usage: generate_workspace --reference DIR --checked DIR [--seed N] [--size MB]\n"
-    "                          [--layout single|directory] [--shape workspace|class|file|group]\n"
+    "                          [--layout single|directory]\n"
+    "                          [--shape workspace|class|file|group|overloads]\n"
     "                          [--count N] [--change-rate R]\n";
 
 [[noreturn]] void UsageError(const char* message, const char* item) {
@@ -86,6 +90,8 @@ Options ParseOptions(int argc, char** argv) {
       options.shape = Shape::kFile;
     } else if (key == "--shape" && value == "group"sv) {
       options.shape = Shape::kGroup;
+    } else if (key == "--shape" && value == "overloads"sv) {
+      options.shape = Shape::kOverloads;
     } else {
       UsageError("bad option or value: ", argv[i - 1]);
     }
@@ -549,6 +555,7 @@ class Generator {
                   std::string_view aut, long methods);
   Method MakeMethod(std::unordered_set<std::string>& names, bool automation);
   Method MakeOverload(const Method& original);
+  void MakeOverloadsOfOneName(Class& klass);
   Arg MakeArg(const std::vector<Arg>& siblings);
   std::string MakeMethodName();
   std::string MakeClassName(std::string_view prefix);
@@ -573,6 +580,9 @@ class Generator {
   std::string MakeFrameworkName(std::string_view prefix);
 
   const Options& options_;
+  // The argument types of the overloads shape, which the methods point to.
+  std::deque<std::string> overload_type_texts_;
+  std::deque<TypeSpelling> overload_types_;
   Random random_;
   SideWriter reference_;
   SideWriter checked_;
@@ -678,6 +688,20 @@ Method Generator::MakeOverload(const Method& original) {
     method.args.back().value = DefaultValueFor(random_, *method.args.back().type);
   }
   return method;
+}
+
+// Makes every method of `klass` a public "Apply" taking one argument of a type of its own, so
+// that their identities differ by the argument's type only: the worst case of pairing.
+void Generator::MakeOverloadsOfOneName(Class& klass) {
+  for (Method& method : klass.methods) {
+    std::string& text = overload_type_texts_.emplace_back("Handle");
+    text += std::to_string(overload_type_texts_.size());
+    text += '*';
+    const TypeSpelling& type = overload_types_.emplace_back(TypeSpelling{text, {}, 'p', 1});
+    method.name = "Apply";
+    method.access = "Public";
+    method.args.assign(1, Arg{&type, "iHandle", {}, false});
+  }
 }
 
 // `aut` is the class's automation flag when given, else drawn (only automation files hold
@@ -978,6 +1002,10 @@ void Generator::WriteGrowthShape() {
     for (long f = 0; f < options_.count; ++f) WriteFilePair(MakeFile(prefix, 1, 3), Scope{});
   } else if (options_.shape == Shape::kFile) {
     WriteFilePair(MakeFile(prefix, options_.count, 3, true), Scope{false, true});
+  } else if (options_.shape == Shape::kOverloads) {
+    File file = MakeFile(prefix, 1, options_.count, true);
+    MakeOverloadsOfOneName(file.classes.front());
+    WriteFilePair(std::move(file), Scope{false, false});
   } else {
     WriteFilePair(MakeFile(prefix, 1, options_.count, true), Scope{false, false});
   }

@@ -1,6 +1,7 @@
 #include "rules/pairing_index.h"
 
 #include <algorithm>
+#include <cstring>
 
 namespace zor2 {
 
@@ -26,16 +27,29 @@ bool HasIdentity(const MethodRecord& m) {
   return m.name != nullptr && m.access != nullptr;
 }
 
-// Equal for records that SameMethod pairs. Only the name, the access and the
-// argument count go in: one pass over two short texts, while the few
-// overloads that share all three are told apart by SameMethod.
+// Equal for records that SameMethod pairs: the whole identity goes in (name,
+// access, argument count and types), so that overloads of one name, however
+// many, fall into runs of their own and pairing stays linear.
 size_t IdentityHash(const MethodRecord& m) {
   size_t hash = 14695981039346656037ULL;  // FNV-1a
   auto add = [&hash](unsigned char byte) { hash = (hash ^ byte) * 1099511628211ULL; };
-  for (const char* c = m.name; *c != '\0'; ++c) add(*c);
-  add('\0');
-  for (const char* c = m.access; *c != '\0'; ++c) add(*c);
+  auto add_text = [&add](const char* text) {
+    for (const char* c = text; *c != '\0'; ++c) add(*c);
+    add('\0');
+  };
+  add_text(m.name);
+  add_text(m.access);
+  for (const ArgumentRecord& arg : m.args) {
+    // An absent type differs from every present one, the empty one included.
+    if (arg.type != nullptr) add_text(arg.type);
+    add(arg.type != nullptr ? '\1' : '\2');
+  }
   return hash ^ m.args.size();
+}
+
+bool SameSignature(const MethodRecord& m, const MethodRecord& n) {
+  return m.signature != nullptr && n.signature != nullptr &&
+         std::strcmp(m.signature, n.signature) == 0;
 }
 
 }  // namespace
@@ -52,10 +66,14 @@ size_t MethodIndex::Find(const MethodRecord& m) const {
   if (!HasIdentity(m)) return npos;
   const size_t hash = IdentityHash(m);
   auto entry = std::lower_bound(entries_.begin(), entries_.end(), Entry{hash, 0});
+  size_t first = npos;
   for (; entry != entries_.end() && entry->hash == hash; ++entry) {
-    if (SameMethod(m, methods_[entry->position])) return entry->position;
+    const MethodRecord& n = methods_[entry->position];
+    if (!SameMethod(m, n)) continue;
+    if (SameSignature(m, n)) return entry->position;
+    if (first == npos) first = entry->position;
   }
-  return npos;
+  return first;
 }
 
 }  // namespace zor2

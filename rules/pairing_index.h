@@ -12,8 +12,8 @@ namespace zor2 {
 
 // Indexes of the checked side of one pairing level. Each answers what a scan
 // of the checked elements from the first one would find for a reference
-// element: the first match, never marked as taken, so that one checked element
-// can pair with several reference elements. Built once per level, so that
+// element: a match, never marked as taken, so that one checked element can
+// pair with several reference elements. Built once per level, so that
 // pairing costs time proportional to the size of the level. An index points
 // into what it was built from, which must outlive it and stay unchanged.
 
@@ -36,8 +36,11 @@ class MethodIndex {
   static constexpr size_t npos = static_cast<size_t>(-1);
 
   explicit MethodIndex(const std::vector<MethodRecord>& methods);
-  // The position (from 0) of the first record n of the list for which
-  // SameMethod(m, n) holds, or npos.
+  // The position (from 0) of the record n of the list that m pairs with: among
+  // those for which SameMethod(m, n) holds, the first whose "Signature" is
+  // m's own, else the first; npos when there is none. Const twins
+  // ("T* F()" and "const T* F() const") share an identity, and each pairs
+  // with its own twin.
   size_t Find(const MethodRecord& m) const;
   bool Contains(const MethodRecord& m) const { return Find(m) != npos; }
 

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <memory>
+#include <string>
 #include <vector>
 
 #include "tests/test_util.h"
@@ -13,9 +14,10 @@
 namespace zor2 {
 namespace {
 
-// The index must answer exactly what a scan for the first SameMethod match
-// answers, duplicates, overloads and incomplete records included.
-TEST(MethodIndexTest, AgreesWithAFirstMatchScan) {
+// The index must answer exactly what a scan of the list answers: the first
+// SameMethod match with the same signature, else the first SameMethod match;
+// duplicates, const twins, overloads and incomplete records included.
+TEST(MethodIndexTest, AgreesWithAScanOfTheList) {
   const char* text = R"xml(<C>
     <M Name="f" Access="Public"><Arg Type="int"/></M>
     <M Name="f" Access="Public"><Arg Type="long"/></M>
@@ -28,6 +30,9 @@ TEST(MethodIndexTest, AgreesWithAFirstMatchScan) {
     <M Access="Public"><Arg Type="int"/></M>
     <M Name="g" Access="Public"/>
     <M Name="f" Access="Public"><Arg/></M>
+    <M Name="t" Access="Public" Signature="T* t()" ReturnedType="T*"/>
+    <M Name="t" Access="Public" Signature="const T* t() const" ReturnedType="const T*"/>
+    <M Name="t" Access="Public" Signature="const T* t() const" ReturnedType="const T*"/>
   </C>)xml";
   auto document = testing::Parse(text);
   std::vector<MethodRecord> methods;
@@ -39,6 +44,12 @@ TEST(MethodIndexTest, AgreesWithAFirstMatchScan) {
   for (const MethodRecord& m : methods) {
     size_t expected = MethodIndex::npos;
     for (size_t j = 0; j < methods.size() && expected == MethodIndex::npos; ++j) {
+      if (SameMethod(m, methods[j]) && m.signature && methods[j].signature &&
+          std::string(m.signature) == methods[j].signature) {
+        expected = j;
+      }
+    }
+    for (size_t j = 0; j < methods.size() && expected == MethodIndex::npos; ++j) {
       if (SameMethod(m, methods[j])) expected = j;
     }
     EXPECT_EQ(index.Find(m), expected) << (m.name ? m.name : "(null)");
@@ -46,6 +57,9 @@ TEST(MethodIndexTest, AgreesWithAFirstMatchScan) {
   EXPECT_EQ(index.Find(methods[2]), 0u);
   EXPECT_EQ(index.Find(methods[10]), 4u);
   EXPECT_EQ(index.Find(methods[7]), MethodIndex::npos);
+  EXPECT_EQ(index.Find(methods[12]), 12u);  // each const twin pairs with its own
+  EXPECT_EQ(index.Find(methods[13]), 12u);
+  EXPECT_EQ(index.Find(methods[11]), 11u);
 }
 
 }  // namespace

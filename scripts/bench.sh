@@ -210,7 +210,7 @@ done
 # --- Growth ----------------------------------------------------------------------------------
 
 growth=()
-for shape in class file group; do
+for shape in class file group overloads; do
   for count in "$n" $((4 * n)); do
     name=$shape-$count-s$seed
     generate "$name" --shape "$shape" --count "$count"
@@ -223,6 +223,8 @@ done
 add_growth "one class of n methods" "${time_of[class-$n]}" "${time_of[class-$((4 * n))]}"
 add_growth "one file of n classes" "${time_of[file-$n]}" "${time_of[file-$((4 * n))]}"
 add_growth "one group of n files" "${time_of[group-$n]}" "${time_of[group-$((4 * n))]}"
+add_growth "one class of n overloads of a name" "${time_of[overloads-$n]}" \
+  "${time_of[overloads-$((4 * n))]}"
 for layout in single directory; do
   add_growth "workspace, $layout, ${quarter} -> ${mb} MB" \
     "${time_of[$layout-$quarter]}" "${time_of[$layout-$mb]}"
