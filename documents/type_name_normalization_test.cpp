@@ -2,16 +2,14 @@
 
 #include <gtest/gtest.h>
 
+#include "tests/test_util.h"
+
 namespace zor2 {
 
 namespace {
 
-// The normalised value, or "<unchanged>" when NormalizeTypeNames answers false.
 std::string Normalized(std::string_view value) {
-  std::string out = "<unchanged>";
-  const bool changed = NormalizeTypeNames(value, &out);
-  EXPECT_EQ(changed, out != "<unchanged>") << value;
-  return out;
+  return testing::Rewritten(NormalizeTypeNames, value);
 }
 
 }  // namespace

@@ -10,12 +10,8 @@
 namespace zor2 {
 namespace {
 
-// The prepared value, or "<unchanged>" when PrepareValue answers false.
 std::string Prepared(std::string_view value) {
-  std::string out = "<unchanged>";
-  const bool changed = PrepareValue(value, &out);
-  EXPECT_EQ(changed, out != "<unchanged>") << value;
-  return out;
+  return testing::Rewritten(PrepareValue, value);
 }
 
 TEST(PrepareValueTest, NormalisesTypeNamesThenDecodesReferences) {

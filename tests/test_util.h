@@ -64,6 +64,15 @@ inline std::vector<std::string> ChildTags(const xml::Element& element) {
   return tags;
 }
 
+// What `rewrite` makes of `value`, or "<unchanged>" when it answers that the
+// value stays; a rewrite that answers so must leave its output alone.
+inline std::string Rewritten(xml::ValueRewrite rewrite, std::string_view value) {
+  std::string out = "<unchanged>";
+  const bool changed = rewrite(value, &out);
+  EXPECT_EQ(changed, out != "<unchanged>") << value;
+  return out;
+}
+
 // The tree of `root` on one line: start tags with their attributes, nesting
 // shown by the end tags.
 inline std::string Shape(const xml::OutputElement& root) {

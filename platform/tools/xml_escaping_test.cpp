@@ -2,16 +2,14 @@
 
 #include <gtest/gtest.h>
 
+#include "tests/test_util.h"
+
 namespace zor2 {
 
 namespace {
 
-// The decoded text, or "<unchanged>" when DecodeXmlReferences reports no change.
 std::string Decoded(std::string_view value) {
-  std::string out = "<unchanged>";
-  const bool changed = DecodeXmlReferences(value, &out);
-  EXPECT_EQ(changed, out != "<unchanged>") << value;
-  return out;
+  return testing::Rewritten(DecodeXmlReferences, value);
 }
 
 }  // namespace
