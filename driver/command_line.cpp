@@ -6,6 +6,7 @@
 #include <string_view>
 #include <vector>
 
+#include "documents/exports.h"
 #include "platform/tools/argument_file.h"
 #include "platform/tools/log.h"
 #include "rules/attribute_values.h"
@@ -21,6 +22,17 @@ constexpr std::string_view kUsage =
     "   -htm : Output Help file\n"
     "   -level\t: Morvane Level (ex: M4R11)\n"
     "   -o   : Output file\n";
+
+// The options that the outputs for release engineers add, and the statuses;
+// "-h" shows them after the usage text above, which usage errors show alone.
+constexpr std::string_view kMoreUsage =
+    "   -summary        : Print one line counting the findings\n"
+    "   -fail           : Exit with status 3 when a finding is not accepted (implies -summary)\n"
+    "   -baseline FILE  : Accept the findings listed in FILE, an earlier report\n"
+    "   -export PATH    : Also write the findings to PATH, as .json, .sarif, .md or .html\n"
+    "                     (may be repeated)\n"
+    "Exit status : 0 done, 1 usage error, 2 an input or output failed,\n"
+    "              3 with -fail, findings not accepted by the baseline\n";
 
 // Writes the pieces and a line end. Pieces are written by length, so that an
 // item read from an argument file is shown whole whatever bytes it holds.
@@ -73,6 +85,19 @@ bool TakeValue(const std::string& option, const std::string& value, OptionScan* 
     config->help_page_path = value;
     return true;
   }
+  if (option == "-baseline") {
+    config->baseline_path = value;
+    return true;
+  }
+  if (option == "-export") {
+    if (!ExportFormatOf(value)) {
+      WriteLine(stderr, {scan->program, ": -export ", value,
+                         ": unknown format (the path must end in .json, .sarif, .md or .html)"});
+      scan->failed = true;
+    }
+    config->export_paths.push_back(value);
+    return true;
+  }
   return false;
 }
 
@@ -90,11 +115,16 @@ std::optional<ExitStatus> ScanOptions(const std::vector<std::string>& items, Opt
       break;
     }
     if (item == "-h") {
-      WriteLine(stdout, {kUsage});
+      WriteLine(stdout, {kUsage, kMoreUsage});
       return ExitStatus::kDone;
     }
     if (item == "-L") {
       config->settings.only_flagged_files = true;
+      continue;
+    }
+    if (item == "-summary" || item == "-fail") {
+      config->summary = true;
+      config->fail = config->fail || item == "-fail";
       continue;
     }
     if (i + 1 < items.size() && TakeValue(item, items[i + 1], scan, config)) {
@@ -129,6 +159,11 @@ void FixLevel(const std::optional<std::string>& level_text, CheckSettings* setti
     settings->current_level = 99;
     log.Warning() << "WARNING: takes default level: M4R99";
   } else {
+    // A typo must not silently change which deprecations are exempt.
+    if (!HoldsReleaseAfterR(level_text->c_str())) {
+      log.Warning() << "WARNING: -level \"" << *level_text
+                    << "\" holds no release number: takes level 0";
+    }
     settings->current_level = ReleaseAfterR(level_text->c_str());
     log.Progress() << "## Level : " << settings->current_level;
   }
@@ -144,6 +179,7 @@ std::optional<ExitStatus> ReadCommandLine(int argc, const char* const* argv,
 
   std::vector<std::string> items;
   if (!CollectItems(argc, argv, scan.program, &items)) return ExitStatus::kUsageError;
+  config->items = items;
   if (std::optional<ExitStatus> help = ScanOptions(items, &scan, config)) return help;
   CheckMandatoryOptions(&scan);
   if (scan.failed) {

@@ -2,6 +2,7 @@
 
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "driver/exit_status.h"
 #include "rules/check_settings.h"
@@ -15,6 +16,11 @@ struct RunConfiguration {
   std::string output_path;                    // "-o": the report
   std::optional<std::string> help_page_path;  // "-htm"
   CheckSettings settings;                     // "-L" and "-level"
+  bool summary = false;                       // "-summary", also set by "-fail"
+  bool fail = false;                          // "-fail": status 3 for findings not accepted
+  std::optional<std::string> baseline_path;   // "-baseline"
+  std::vector<std::string> export_paths;      // "-export", in their order
+  std::vector<std::string> items;             // the command line as read, for the exports
 };
 
 // Reads the program's arguments (`argv[0]` is the program name; `argv` holds

@@ -20,12 +20,17 @@
 #include <cerrno>
 #include <cstring>
 #include <future>
+#include <iterator>
 #include <memory>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
 
+#include "documents/baseline.h"
+#include "documents/exports.h"
 #include "documents/help_page.h"
+#include "documents/run_summary.h"
 #include "driver/pair_loading.h"
 #include "platform/tools/background.h"
 #include "platform/tools/file_output.h"
@@ -36,6 +41,8 @@
 
 namespace zor2 {
 namespace {
+
+constexpr const char* kToolVersion = "zor2check 2.0";
 
 enum class InputMode { kFilePair, kDirectoryPair, kUnusable };
 
@@ -49,14 +56,23 @@ InputMode ChooseInputMode(const std::string& reference, const std::string& check
 class ComparisonRun {
  public:
   explicit ComparisonRun(const RunConfiguration& config)
-      : config_(config), report_("XmlDiff"), log_(Log::Standard()) {}
+      : config_(config),
+        report_("XmlDiff"),
+        log_(Log::Standard()),
+        collecting_(config.summary || config.baseline_path || !config.export_paths.empty()) {}
 
   ExitStatus Run() {
+    ReadBaseline();
     CompareInputs();
+    if (discarding_.valid()) discarding_.get();
+    AcceptBaselineFindings();
     WriteReport();
     WriteHelpPage();
-    if (discarding_.valid()) discarding_.get();
-    return incomplete_ ? ExitStatus::kIncomplete : ExitStatus::kDone;
+    WriteExports();
+    if (config_.summary) log_.Progress() << SummaryLine(summary_);
+    if (incomplete_) return ExitStatus::kIncomplete;
+    if (summary_.failed) return ExitStatus::kFindingsNotAccepted;
+    return ExitStatus::kDone;
   }
 
  private:
@@ -70,7 +86,7 @@ class ComparisonRun {
   void CompareInputs() {
     switch (ChooseInputMode(config_.reference_path, config_.checked_path)) {
       case InputMode::kFilePair:
-        ComparePair(LoadPair(config_.reference_path, config_.checked_path));
+        ComparePair(LoadPair(config_.reference_path, config_.checked_path, KeepOriginals()));
         return;
       case InputMode::kDirectoryPair:
         CompareDirectories();
@@ -121,11 +137,17 @@ class ComparisonRun {
       return;
     }
     std::vector<PairReader::Paths> pairs;
+    summary_.directory_mode = true;
     for (std::string& entry : entries) {
-      std::string checked = JoinPath(config_.checked_path, BaseName(entry));
-      if (IsRegularFile(checked)) pairs.push_back({std::move(entry), std::move(checked)});
+      std::string name = BaseName(entry);
+      std::string checked = JoinPath(config_.checked_path, name);
+      if (IsRegularFile(checked)) {
+        pairs.push_back({std::move(entry), std::move(checked)});
+      } else {
+        summary_.missing_counterparts.push_back(std::move(name));
+      }
     }
-    PairReader reader(std::move(pairs));
+    PairReader reader(std::move(pairs), KeepOriginals());
     while (reader.HasNext()) ComparePair(reader.Next());
   }
 
@@ -135,8 +157,16 @@ class ComparisonRun {
     ReportLoadFault(pair.reference);
     ReportLoadFault(pair.checked);
     if (pair.reference.document && pair.checked.document) {
+      ++summary_.pairs_compared;
+      FindingCollector collector(&pair.reference.originals, &pair.checked.originals);
       CompareFrameworks(pair.reference.document->root(), pair.checked.document->root(),
-                        config_.settings, report_, log_);
+                        config_.settings, report_, log_, collecting_ ? &collector : nullptr);
+      // The findings hold copies of the values they show, never pointers into
+      // the documents.
+      findings_.insert(findings_.end(), std::make_move_iterator(collector.findings().begin()),
+                       std::make_move_iterator(collector.findings().end()));
+    } else {
+      ++summary_.pairs_skipped;
     }
     Discard(std::move(pair));
   }
@@ -152,14 +182,56 @@ class ComparisonRun {
   }
 
   void ReportLoadFault(const LoadedDocument& loaded) {
-    if (loaded.document) return;
-    const xml::ReadError& error = loaded.error;
+    if (!loaded.document) ReportReadError(loaded.path, loaded.error);
+  }
+
+  void ReportReadError(const std::string& path, const xml::ReadError& error) {
     if (error.line > 0) {
-      ReportFailure(
-          loaded.path + ":" + std::to_string(error.line) + ":" + std::to_string(error.column),
-          error.reason);
+      ReportFailure(path + ":" + std::to_string(error.line) + ":" + std::to_string(error.column),
+                    error.reason);
     } else {
-      ReportFailure(loaded.path, error.reason);
+      ReportFailure(path, error.reason);
+    }
+  }
+
+  // Only the exports show values, as the documents wrote them.
+  bool KeepOriginals() const { return !config_.export_paths.empty(); }
+
+  // A baseline that cannot be read is an input failure, not an empty
+  // baseline: the run goes on without it.
+  void ReadBaseline() {
+    if (!config_.baseline_path) return;
+    xml::ReadError error;
+    if (baseline_.emplace().Read(*config_.baseline_path, &error)) return;
+    baseline_.reset();
+    ReportReadError(*config_.baseline_path, error);
+  }
+
+  // Marks the findings that the baseline accepts, names its entries that
+  // match no finding any more, and counts.
+  void AcceptBaselineFindings() {
+    if (!collecting_) return;
+    summary_.baseline = config_.baseline_path.has_value();
+    if (baseline_) {
+      baseline_->Accept(&findings_);
+      const std::vector<std::string> stale = baseline_->StaleEntries();
+      for (const std::string& entry : stale) {
+        log_.Warning() << "WARNING: " << *config_.baseline_path << ": no longer found: " << entry;
+      }
+      summary_.stale_baseline_entries = static_cast<int>(stale.size());
+    }
+    CountFindings(findings_, &summary_);
+    summary_.failed = config_.fail && summary_.not_accepted > 0;
+  }
+
+  void WriteExports() {
+    if (config_.export_paths.empty()) return;
+    RunDescription run{kToolVersion, config_.reference_path, config_.checked_path,
+                       config_.output_path, config_.items};
+    for (const std::string& path : config_.export_paths) {
+      std::string err;
+      const std::string text = ExportText(*ExportFormatOf(path), run, summary_, findings_);
+      if (!WriteFileAtomically(path, text, &err)) ReportFailure(path, err);
     }
   }
 
@@ -187,6 +259,10 @@ class ComparisonRun {
   const RunConfiguration& config_;
   xml::OutputElement report_;
   Log& log_;
+  const bool collecting_;  // findings are collected for the summary, baseline or exports
+  std::vector<Finding> findings_;
+  RunSummary summary_;
+  std::optional<Baseline> baseline_;
   bool incomplete_ = false;
   std::future<void> discarding_;  // frees the documents of the last pair
 };

@@ -2,8 +2,9 @@
 
 namespace zor2 {
 
-// The process's exit statuses. Findings never change the status: only how far
-// the program could do what it was asked.
+// The process's exit statuses. Findings change the status only when "-fail"
+// asks them to; otherwise it says how far the program could do what it was
+// asked.
 enum class ExitStatus : int {
   // The run did all it was asked, whatever it found; also after "-h".
   kDone = 0,
@@ -12,6 +13,9 @@ enum class ExitStatus : int {
   // The run went on, but an input could not be read or an output could not be
   // written.
   kIncomplete = 2,
+  // With "-fail": the run did all it was asked, and found what the baseline
+  // does not accept.
+  kFindingsNotAccepted = 3,
 };
 
 }  // namespace zor2

@@ -12,10 +12,10 @@ namespace zor2 {
 namespace {
 
 // Touches nothing but its own document, so that loads can run at once.
-LoadedDocument LoadDocument(const std::string& path) {
-  LoadedDocument loaded{path, nullptr, {}};
+LoadedDocument LoadDocument(const std::string& path, bool keep_originals) {
+  LoadedDocument loaded{path, nullptr, {}, {}};
   if (xml::ReadDocumentFile(path, &loaded.document, &loaded.error)) {
-    loaded.document->RewriteValues(PrepareValue);
+    loaded.document->RewriteValues(PrepareValue, keep_originals ? &loaded.originals : nullptr);
   }
   return loaded;
 }
@@ -43,10 +43,10 @@ bool PrepareValue(std::string_view value, std::string* rewritten) {
   return true;
 }
 
-LoadedPair LoadPair(const std::string& reference, const std::string& checked) {
+LoadedPair LoadPair(const std::string& reference, const std::string& checked, bool keep_originals) {
   std::future<LoadedDocument> checked_load =
-      RunInBackground([checked] { return LoadDocument(checked); });
-  LoadedDocument reference_document = LoadDocument(reference);
+      RunInBackground([checked, keep_originals] { return LoadDocument(checked, keep_originals); });
+  LoadedDocument reference_document = LoadDocument(reference, keep_originals);
   return {std::move(reference_document), checked_load.get()};
 }
 
@@ -68,8 +68,11 @@ void PairReader::Start() {
   const Paths& paths = pairs_[started_++];
   const uintmax_t bytes = PairBytes(paths);
   // The paths are copied into the task, which may outlive this reader's.
-  ahead_.push_back(
-      {RunInBackground([paths] { return LoadPair(paths.reference, paths.checked); }), bytes});
+  const bool keep_originals = keep_originals_;
+  ahead_.push_back({RunInBackground([paths, keep_originals] {
+                      return LoadPair(paths.reference, paths.checked, keep_originals);
+                    }),
+                    bytes});
   bytes_ahead_ += bytes;
 }
 

@@ -24,6 +24,8 @@ struct LoadedDocument {
   std::string path;
   std::unique_ptr<xml::Document> document;  // null when it could not be read
   xml::ReadError error;                     // why, when document is null
+  // The text of the values that preparation changed, when it was asked for.
+  xml::OriginalValues originals;
 };
 
 // The two documents of a pair.
@@ -39,9 +41,10 @@ struct LoadedPair {
 bool PrepareValue(std::string_view value, std::string* rewritten);
 
 // Reads the documents at `reference` and `checked`, each on its own thread,
-// and prepares every attribute value of each. Returns when both are done; a
-// document that cannot be read comes back without document.
-LoadedPair LoadPair(const std::string& reference, const std::string& checked);
+// and prepares every attribute value of each, keeping the original text of
+// the values it changes when `keep_originals` is set. Returns when both are
+// done; a document that cannot be read comes back without document.
+LoadedPair LoadPair(const std::string& reference, const std::string& checked, bool keep_originals);
 
 // The document pairs of a run, loaded in order, the next ones ahead while the
 // caller compares the current one: with small pairs, comparing one pair on one
@@ -60,7 +63,8 @@ class PairReader {
   static constexpr size_t kPairsAhead = 2;
   static constexpr uintmax_t kReadAheadBytes = uintmax_t{16} << 20;
 
-  explicit PairReader(std::vector<Paths> pairs) : pairs_(std::move(pairs)) {}
+  PairReader(std::vector<Paths> pairs, bool keep_originals)
+      : pairs_(std::move(pairs)), keep_originals_(keep_originals) {}
   PairReader(const PairReader&) = delete;
   PairReader& operator=(const PairReader&) = delete;
 
@@ -77,6 +81,7 @@ class PairReader {
   void Start();
 
   std::vector<Paths> pairs_;
+  bool keep_originals_;
   size_t taken_ = 0;    // pairs handed out
   size_t started_ = 0;  // pairs whose loading has started
   std::deque<Loading> ahead_;

@@ -30,12 +30,15 @@ using LoadPairTest = testing::TempDirTest;
 // Documents that cannot be read or parsed are in the end-to-end cases.
 TEST_F(LoadPairTest, ReadsAndPreparesBothDocuments) {
   LoadedPair pair = LoadPair(Write("ref.xml", R"(<W><M Type="unsigned long &amp;"/></W>)"),
-                             Write("chk.xml", R"(<W><M Type="long long"/></W>)"));
+                             Write("chk.xml", R"(<W><M Type="long long"/></W>)"), true);
   ASSERT_NE(pair.reference.document, nullptr);
   ASSERT_NE(pair.checked.document, nullptr);
   EXPECT_STREQ(pair.reference.document->root().first_child()->FindAttribute("Type"),
                "QEXULONG32 &");
-  EXPECT_STREQ(pair.checked.document->root().first_child()->FindAttribute("Type"), "QEXLONG64");
+  const char* checked_type = pair.checked.document->root().first_child()->FindAttribute("Type");
+  EXPECT_STREQ(checked_type, "QEXLONG64");
+  // The text as written is kept for what preparation changed.
+  EXPECT_EQ(pair.checked.originals.Find(checked_type), "long long");
 }
 
 // Pairs are read ahead on other threads but handed out in their order.
@@ -48,7 +51,7 @@ TEST_F(LoadPairTest, ReadsThePairsOfARunInOrder) {
   }
   // A pair whose reference document is missing keeps its place.
   paths.insert(paths.begin() + 2, {Path("none.xml"), paths[0].checked});
-  PairReader reader(paths);
+  PairReader reader(paths, false);
   std::string order;
   while (reader.HasNext()) {
     LoadedPair pair = reader.Next();

@@ -35,6 +35,16 @@ int ReleaseAfterR(const char* value) {
   return SaturatingAtoi(r + 1);
 }
 
+bool HoldsReleaseAfterR(const char* value) {
+  if (value == nullptr || std::strlen(value) < 4) return false;
+  const char* p = std::strchr(value, 'R');
+  if (p == nullptr) return false;
+  ++p;
+  while (std::isspace(static_cast<unsigned char>(*p))) ++p;
+  if (*p == '+' || *p == '-') ++p;
+  return *p >= '0' && *p <= '9';
+}
+
 int ReleaseFromFourthCharacter(const char* value) {
   if (value == nullptr || std::strlen(value) < 4) return 0;
   long long release = 0;

@@ -26,6 +26,10 @@ inline bool FirstWordIs(const char* value, std::string_view word) {
 // shorter than 4 characters, has no "R", or nothing after it.
 int ReleaseAfterR(const char* value);
 
+// True when ReleaseAfterR reads a number from `value`, rather than answering 0
+// for want of one ("banana", "R", "M4Rx").
+bool HoldsReleaseAfterR(const char* value);
+
 // The release of a method's "Deprecated" value: the number written by the
 // characters from the fourth one to the end when they are all decimal digits
 // (and there is at least one), clamped to the 32-bit range; 0 otherwise, and

@@ -41,6 +41,13 @@ TEST(ReleaseAfterRTest, ReadsTheNumberAfterTheFirstR) {
       {"M4R-2147483648", INT_MIN},
   };
   for (const auto& c : cases) EXPECT_EQ(ReleaseAfterR(c.text), c.release) << c.text;
+  for (const char* number : {"M4R11", "M4R00", "M4R -5", "M4R2a"}) {
+    EXPECT_TRUE(HoldsReleaseAfterR(number)) << number;
+  }
+  const char* const nones[] = {"banana", "R", "R55", "XM4R", "M4RxR20", "M4R -", nullptr};
+  for (const char* none : nones) {
+    EXPECT_FALSE(HoldsReleaseAfterR(none)) << (none ? none : "(null)");
+  }
   EXPECT_EQ(ReleaseAfterR(nullptr), 0);
   EXPECT_EQ(ReleaseAfterR(("M4R" + std::string(10000, '9')).c_str()), INT_MAX);
 }

@@ -66,17 +66,25 @@ bool SameLevel(const char* reference, const char* checked) {
 // its classes must be checked for new pure virtual methods.
 bool CheckLevelAndUsage(const xml::Element& reference, const xml::Element& checked, bool exempt,
                         ReportMirror& report_file, Log& log) {
-  if (!SameLevel(reference.FindAttribute("@ZOR2Level"), checked.FindAttribute("@ZOR2Level")) &&
-      !exempt) {
-    AddError(report_file, MessageCode::kLHC);
+  const char* reference_level = reference.FindAttribute("@ZOR2Level");
+  const char* checked_level = checked.FindAttribute("@ZOR2Level");
+  if (!SameLevel(reference_level, checked_level) && !exempt) {
+    AddError(report_file, MessageCode::kLHC, [&](const FindingCollector& shown) {
+      return ComparedValues{shown.AsWritten(reference_level), shown.AsWritten(checked_level)};
+    });
   }
-  const std::string_view reference_usage = FirstWord(reference.FindAttribute("@ZOR2Usage"));
-  const std::string_view checked_usage = FirstWord(checked.FindAttribute("@ZOR2Usage"));
+  const char* reference_usage_value = reference.FindAttribute("@ZOR2Usage");
+  const char* checked_usage_value = checked.FindAttribute("@ZOR2Usage");
+  const std::string_view reference_usage = FirstWord(reference_usage_value);
+  const std::string_view checked_usage = FirstWord(checked_usage_value);
   if (reference_usage.empty()) {
     log.Warning() << " Warning : File " << reference.FindAttribute("Name")
                   << " is L1 and has no ZOR2Usage ";
   } else if (!AllowedUsageChange(reference_usage, checked_usage) && !exempt) {
-    AddError(report_file, MessageCode::kUHC);
+    AddError(report_file, MessageCode::kUHC, [&](const FindingCollector& shown) {
+      return ComparedValues{shown.AsWritten(reference_usage_value),
+                            shown.AsWritten(checked_usage_value)};
+    });
   }
   // Classes of usage U2 or U5 must not gain pure virtual methods, even when
   // the usage change itself was forbidden.

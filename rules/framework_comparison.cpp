@@ -1,7 +1,9 @@
 #include "rules/framework_comparison.h"
 
 #include <atomic>
+#include <iterator>
 #include <memory>
+#include <optional>
 #include <vector>
 
 #include "platform/tools/background.h"
@@ -22,12 +24,14 @@ struct FrameworkPair {
   const xml::Element* checked = nullptr;
   std::unique_ptr<xml::OutputElement> mirror;
   Log log;
+  std::optional<FindingCollector> findings;
   std::atomic<bool> done{false};  // set by the thread that compared it, last
 };
 
 void ComparePair(FrameworkPair& pair, const CheckSettings& settings) {
   const char* name = pair.reference->FindAttribute("Name");
-  ReportMirror report_framework(&pair.mirror, "Framework");
+  ReportMirror report_framework(&pair.mirror, "Framework",
+                                pair.findings ? &*pair.findings : nullptr);
   report_framework.CopyAttribute("Name", name);
   pair.log.Progress() << "Checking : " << name;
   CompareInterfaceFiles(*pair.reference, *pair.checked, "Public", settings, report_framework,
@@ -42,19 +46,26 @@ void ComparePair(FrameworkPair& pair, const CheckSettings& settings) {
 // pair after the other while progress lines come as soon as they can. Only the
 // thread that called CompareFrameworks commits.
 void CommitDone(std::vector<FrameworkPair>& pairs, size_t& committed, xml::OutputElement& report,
-                Log& log) {
+                Log& log, FindingCollector* collector) {
   for (; committed < pairs.size() && pairs[committed].done.load(std::memory_order_acquire);
        ++committed) {
     FrameworkPair& pair = pairs[committed];
     pair.log.ReplayInto(log);
     if (pair.mirror != nullptr) report.AddChild(std::move(pair.mirror));
+    if (collector != nullptr) {
+      std::vector<Finding>& found = pair.findings->findings();
+      collector->findings().insert(collector->findings().end(),
+                                   std::make_move_iterator(found.begin()),
+                                   std::make_move_iterator(found.end()));
+    }
   }
 }
 
 }  // namespace
 
 void CompareFrameworks(const xml::Element& reference, const xml::Element& checked,
-                       const CheckSettings& settings, xml::OutputElement& report, Log& log) {
+                       const CheckSettings& settings, xml::OutputElement& report, Log& log,
+                       FindingCollector* collector) {
   const NameIndex checked_frameworks(ChildElements(checked, "Framework"));
   std::vector<const xml::Element*> references;
   std::vector<const xml::Element*> counterparts;
@@ -68,6 +79,7 @@ void CompareFrameworks(const xml::Element& reference, const xml::Element& checke
   for (size_t i = 0; i < pairs.size(); ++i) {
     pairs[i].reference = references[i];
     pairs[i].checked = counterparts[i];
+    if (collector != nullptr) pairs[i].findings.emplace(collector->Part());
   }
 
   // Each thread takes the next pair not yet taken; the pairs only read the
@@ -81,10 +93,10 @@ void CompareFrameworks(const xml::Element& reference, const xml::Element& checke
   size_t committed = 0;
   for (size_t i; (i = next++) < pairs.size();) {
     ComparePair(pairs[i], settings);
-    CommitDone(pairs, committed, report, log);
+    CommitDone(pairs, committed, report, log, collector);
   }
   if (helper.valid()) helper.get();
-  CommitDone(pairs, committed, report, log);
+  CommitDone(pairs, committed, report, log, collector);
 }
 
 }  // namespace zor2

@@ -4,6 +4,7 @@
 #include "platform/xml/document.h"
 #include "platform/xml/output_element.h"
 #include "rules/check_settings.h"
+#include "rules/finding.h"
 
 namespace zor2 {
 
@@ -13,8 +14,10 @@ namespace zor2 {
 // `report`, each under the mirrors of the reference elements that lead to it.
 // A reference framework without counterpart is passed over. The framework
 // pairs are compared on two threads when there are several; the report and
-// the lines written to `log` come out in reference order all the same.
+// the lines written to `log` come out in reference order all the same. With a
+// `collector`, every finding is also collected there, in report order.
 void CompareFrameworks(const xml::Element& reference, const xml::Element& checked,
-                       const CheckSettings& settings, xml::OutputElement& report, Log& log);
+                       const CheckSettings& settings, xml::OutputElement& report, Log& log,
+                       FindingCollector* collector = nullptr);
 
 }  // namespace zor2

@@ -1,6 +1,7 @@
 #include "rules/method_comparison.h"
 
 #include <cstdint>
+#include <cstring>
 #include <string>
 
 #include "rules/method_lists.h"
@@ -29,6 +30,11 @@ bool HasRetval(const ArgumentRecord& a) {
   return a.retval != nullptr;
 }
 
+// How a finding on argument `k` (from 0) names it.
+std::string ArgumentName(size_t k) {
+  return "Arg_" + std::to_string(k + 1);
+}
+
 void CompareArguments(const MethodRecord& m, const MethodRecord& n, ReportMirror& report_method,
                       Log& log) {
   if (m.args.size() != n.args.size()) {
@@ -41,17 +47,43 @@ void CompareArguments(const MethodRecord& m, const MethodRecord& n, ReportMirror
     const ArgumentRecord& a = m.args[k];
     const ArgumentRecord& b = n.args[k];
     if (!SameDefaultValue(a, b)) {
-      const std::string name = "Arg_" + std::to_string(k + 1);
+      const std::string name = ArgumentName(k);
       ReportMirror report_arg(report_method, "Arg");
       report_arg.CopyAttribute("Name", name.c_str());
       report_arg.CopyAttribute("Type", a.type);
-      AddError(report_arg, MessageCode::kADVHC);
+      AddError(report_arg, MessageCode::kADVHC, [&](const FindingCollector& shown) {
+        return ComparedValues{shown.AsWritten(a.value), shown.AsWritten(b.value)};
+      });
     }
     if (!retval_reported && HasRetval(a) != HasRetval(b)) {
       retval_reported = true;
-      AddError(report_method, MessageCode::kARVHC);
+      AddError(report_method, MessageCode::kARVHC, [&](const FindingCollector&) {
+        auto marker = [&k](const ArgumentRecord& arg) {
+          return ArgumentName(k) + (HasRetval(arg) ? " Retval" : " without Retval");
+        };
+        return ComparedValues{marker(a), marker(b)};
+      });
     }
   }
+}
+
+// The signatures of the methods of `cls` named `name`, the likely
+// replacements of a deleted method, one per line.
+std::string SignaturesNamed(const xml::Element& cls, const char* name,
+                            const FindingCollector& shown) {
+  std::string signatures;
+  if (name == nullptr) return signatures;
+  for (const xml::Element* child = cls.first_child(); child; child = child->next_sibling()) {
+    const char* child_name = child->FindAttribute("Name");
+    const char* signature = child->FindAttribute("Signature");
+    if (std::strcmp(child->tag(), "Method") != 0 || signature == nullptr || child_name == nullptr ||
+        std::strcmp(child_name, name) != 0) {
+      continue;
+    }
+    if (!signatures.empty()) signatures += '\n';
+    signatures += shown.AsWritten(signature);
+  }
+  return signatures;
 }
 
 // The rules for a reference method m at position i whose counterpart n is at
@@ -62,14 +94,24 @@ void CompareMethodPair(const MethodRecord& m, size_t i, const MethodRecord& n, s
   if (automation) {
     if (!order_reported && j != i) {
       order_reported = true;
-      AddError(report_method, MessageCode::kMOHBC);
+      AddError(report_method, MessageCode::kMOHBC, [&](const FindingCollector&) {
+        return ComparedValues{"position " + std::to_string(i + 1),
+                              "position " + std::to_string(j + 1)};
+      });
     }
     if (PropertyModifierChanged(m.property, n.property)) {
-      AddError(report_method, MessageCode::kPMHC);
+      AddError(report_method, MessageCode::kPMHC, [&](const FindingCollector& shown) {
+        return ComparedValues{shown.AsWritten(m.element->FindAttribute("Property")),
+                              shown.AsWritten(n.element->FindAttribute("Property"))};
+      });
     }
   }
   if (n.nodoc && !m.nodoc) AddError(report_method, MessageCode::kINDM);
-  if (!SameReturnedType(m, n)) AddError(report_method, MessageCode::kMRTHC);
+  if (!SameReturnedType(m, n)) {
+    AddError(report_method, MessageCode::kMRTHC, [&](const FindingCollector& shown) {
+      return ComparedValues{shown.AsWritten(m.returned_type), shown.AsWritten(n.returned_type)};
+    });
+  }
   CompareArguments(m, n, report_method, log);
 }
 
@@ -80,7 +122,9 @@ void CompareMethods(const xml::Element& reference, const xml::Element& checked,
   const char* reference_aut = reference.FindAttribute("Aut");
   const char* checked_aut = checked.FindAttribute("Aut");
   if (StartsWith(reference_aut, 'Y') && StartsWith(checked_aut, 'N')) {
-    AddError(report, MessageCode::kCINMA);
+    AddError(report, MessageCode::kCINMA, [&](const FindingCollector& shown) {
+      return ComparedValues{shown.AsWritten(reference_aut), shown.AsWritten(checked_aut)};
+    });
   }
 
   const std::vector<MethodRecord> reference_methods =
@@ -99,7 +143,10 @@ void CompareMethods(const xml::Element& reference, const xml::Element& checked,
     ReportMirror report_method(report, "Method");
     MirrorMethod(report_method, m);
     if (j == MethodIndex::npos) {
-      AddError(report_method, MessageCode::kMHBDM);
+      AddError(report_method, MessageCode::kMHBDM, [&](const FindingCollector& shown) {
+        return ComparedValues{shown.AsWritten(m.signature),
+                              SignaturesNamed(checked, m.name, shown)};
+      });
       continue;
     }
     CompareMethodPair(m, i, checked_methods[j], j, automation, order_reported, report_method, log);

@@ -1,11 +1,16 @@
 #include "rules/report_mirror.h"
 
 #include <cstdlib>
+#include <cstring>
+#include <string>
+#include <vector>
 
 namespace zor2 {
 
 void ReportMirror::CopyAttribute(const char* name, const char* value) {
   if (value == nullptr) return;
+  if (std::strcmp(name, "Name") == 0) name_ = value;
+  if (std::strcmp(name, "Signature") == 0) signature_ = value;
   if (element_ != nullptr) {
     element_->SetAttribute(name, value);
     return;
@@ -32,12 +37,47 @@ xml::OutputElement* ReportMirror::Element() {
   return element_;
 }
 
-void AddError(ReportMirror& parent, MessageCode code) {
+FindingCollector* ReportMirror::collector() const {
+  const ReportMirror* top = this;
+  while (top->parent_ != nullptr) top = top->parent_;
+  return top->collector_;
+}
+
+void ReportMirror::Locate(Finding* finding) const {
+  const FindingCollector* shown = collector();
+  std::vector<std::string> steps;  // from this mirror up
+  for (const ReportMirror* mirror = this; mirror != nullptr; mirror = mirror->parent_) {
+    if (mirror->tag_ == nullptr) continue;  // the report root
+    const std::string_view tag = mirror->tag_;
+    std::string name = shown->AsWritten(mirror->name_);
+    if (tag == "Framework") finding->framework = name;
+    if (tag == "Interfaces") finding->group = name;
+    if (tag == "File") finding->file = name;
+    if (tag == "Class") finding->class_name = name;
+    if (tag == "Arg") finding->argument = name;
+    if (tag == "Method") {
+      finding->method = name;
+      finding->signature = shown->AsWritten(mirror->signature_);
+    }
+    steps.push_back(ReportStep(tag, mirror->name_, mirror->signature_));
+  }
+  for (auto step = steps.rbegin(); step != steps.rend(); ++step) finding->report_path += *step;
+  finding->report_path += MessageTypeOf(finding->code).id;
+}
+
+Finding* AddError(ReportMirror& parent, MessageCode code) {
   const MessageType& type = MessageTypeOf(code);
   xml::OutputElement* error = parent.Element()->AddChild("Error");
   error->SetAttribute("ID", type.id);
   error->SetAttribute("FullName", type.full_name);
   error->SetAttribute("Help", type.help);
+  FindingCollector* collector = parent.collector();
+  if (collector == nullptr) return nullptr;
+  Finding& finding = collector->findings().emplace_back();
+  finding.code = code;
+  finding.report_error = error;
+  parent.Locate(&finding);
+  return &finding;
 }
 
 void MirrorMethod(ReportMirror& report_method, const MethodRecord& method) {

@@ -5,6 +5,7 @@
 #include <memory>
 
 #include "platform/xml/output_element.h"
+#include "rules/finding.h"
 #include "rules/message_types.h"
 #include "rules/method_records.h"
 
@@ -24,10 +25,12 @@ class ReportMirror {
   // outlive this mirror.
   ReportMirror(ReportMirror& parent, const char* tag) : parent_(&parent), tag_(tag) {}
   // A pending element `tag` that is created into `*holder` instead of under a
-  // parent, for the caller to hand to the report later. `holder` must outlive
-  // this mirror.
-  ReportMirror(std::unique_ptr<xml::OutputElement>* holder, const char* tag)
-      : holder_(holder), tag_(tag) {}
+  // parent, for the caller to hand to the report later; the findings recorded
+  // under it also go to `collector` unless it is null. `holder` and
+  // `collector` must outlive this mirror.
+  ReportMirror(std::unique_ptr<xml::OutputElement>* holder, const char* tag,
+               FindingCollector* collector)
+      : holder_(holder), collector_(collector), tag_(tag) {}
   ReportMirror(const ReportMirror&) = delete;
   ReportMirror& operator=(const ReportMirror&) = delete;
 
@@ -42,6 +45,11 @@ class ReportMirror {
   // not exist yet.
   xml::OutputElement* Element();
 
+  // Where findings recorded under this mirror are collected, or null.
+  FindingCollector* collector() const;
+  // Fills the location of `finding` from this mirror and its ancestors.
+  void Locate(Finding* finding) const;
+
  private:
   struct Attribute {
     const char* name;
@@ -51,15 +59,36 @@ class ReportMirror {
 
   ReportMirror* parent_ = nullptr;
   std::unique_ptr<xml::OutputElement>* holder_ = nullptr;
+  FindingCollector* collector_ = nullptr;
   const char* tag_ = nullptr;
+  const char* name_ = nullptr;       // its "Name", for findings
+  const char* signature_ = nullptr;  // its "Signature", for findings
   xml::OutputElement* element_ = nullptr;
   std::array<Attribute, kMaxPendingAttributes> pending_{};
   size_t pending_count_ = 0;
 };
 
+// What a rule compared for a finding, as the documents wrote it.
+struct ComparedValues {
+  std::string reference;
+  std::string checked;
+};
+
 // Records a finding of type `code` under `parent`: an "Error" element with
-// "ID", "FullName" and "Help", appended as its last child.
-void AddError(ReportMirror& parent, MessageCode code);
+// "ID", "FullName" and "Help", appended as its last child; and, when the walk
+// collects findings, a Finding, which is returned (null otherwise).
+Finding* AddError(ReportMirror& parent, MessageCode code);
+
+// The same, for a rule that compared values: `describe(collector)` gives them
+// as a ComparedValues, and is only called when findings are collected.
+template <typename Describe>
+void AddError(ReportMirror& parent, MessageCode code, Describe describe) {
+  if (Finding* finding = AddError(parent, code)) {
+    ComparedValues values = describe(*parent.collector());
+    finding->reference_value = std::move(values.reference);
+    finding->checked_value = std::move(values.checked);
+  }
+}
 
 // Gives a "Method" mirror the "Name" and then the "Signature" of `method`.
 void MirrorMethod(ReportMirror& report_method, const MethodRecord& method);

@@ -1,8 +1,10 @@
 #include "platform/xml/document.h"
 
+#include <algorithm>
 #include <climits>
 #include <cstdint>
 #include <cstring>
+#include <functional>
 #include <new>
 #include <vector>
 
@@ -44,6 +46,7 @@ struct Document::RewritePass {
     size_t length;
   };
   ValueRewrite rewrite;
+  OriginalValues* originals;
   std::string scratch;
   std::string grown_text;
   std::vector<Grown> grown;
@@ -61,8 +64,36 @@ char* Document::AllocateSpare(size_t size) {
   return text_.data() + offset;
 }
 
-void Document::RewriteValues(ValueRewrite rewrite) {
-  RewritePass pass{rewrite, {}, {}, {}};
+void OriginalValues::Add(const char* value, std::string_view original) {
+  entries_.push_back({value, text_.size(), original.size()});
+  text_ += original;
+}
+
+void OriginalValues::Seal() {
+  std::sort(entries_.begin(), entries_.end(),
+            [](const Entry& a, const Entry& b) { return std::less<>()(a.value, b.value); });
+}
+
+std::optional<std::string_view> OriginalValues::Find(const char* value) const {
+  auto entry =
+      std::lower_bound(entries_.begin(), entries_.end(), value,
+                       [](const Entry& e, const char* v) { return std::less<>()(e.value, v); });
+  if (entry == entries_.end() || entry->value != value) return std::nullopt;
+  return std::string_view(text_).substr(entry->offset, entry->length);
+}
+
+void Document::RewriteValues(ValueRewrite rewrite, OriginalValues* originals) {
+  RewritePass pass{rewrite, originals, {}, {}, {}};
+  if (originals != nullptr) {
+    // The originals are the values as this pass found them.
+    originals->entries_.clear();
+    originals->text_.clear();
+  }
+  RewriteAll(pass);
+  if (originals != nullptr) originals->Seal();
+}
+
+void Document::RewriteAll(RewritePass& pass) {
   // Document order, without recursion: `open` holds the ancestors of
   // `element`.
   std::vector<Element*> open;
@@ -108,12 +139,20 @@ void Document::RewriteElement(Element& element, RewritePass& pass) {
     std::string_view text = UpToZero(pass.scratch);
     size_t room = value.size();
     if (text.size() <= room) {
+      if (pass.originals != nullptr) pass.originals->Add(value.data(), value);
       char* place = const_cast<char*>(value.data());  // the document's own buffer
       std::memcpy(place, text.data(), text.size());
       std::memset(place + text.size(), 0, room - text.size());
       continue;
     }
-    if (MoveValue(const_cast<char*>(slot), room, text)) continue;
+    // Moving overwrites the start of the slot, so the original is kept first
+    // and given its new place after.
+    if (pass.originals != nullptr) pass.originals->Add(nullptr, value);
+    if (const char* moved = MoveValue(const_cast<char*>(slot), room, text)) {
+      if (pass.originals != nullptr) pass.originals->entries_.back().value = moved;
+      continue;
+    }
+    if (pass.originals != nullptr) pass.originals->entries_.pop_back();
     pass.grown.push_back({value.data(), pass.grown_text.size(), text.size()});
     pass.grown_text += text;
   }
@@ -123,12 +162,12 @@ void Document::RewriteElement(Element& element, RewritePass& pass) {
 // Gives a grown value a new home in the spare capacity after the text and
 // points its slot there. False when the slot is too small to point (values
 // under three characters) or the spare capacity is used up.
-bool Document::MoveValue(char* slot, size_t room, std::string_view text) {
+const char* Document::MoveValue(char* slot, size_t room, std::string_view text) {
   bool moved = *slot == kMovedValue;
-  if (!moved && room + 2 < kMovedValueSlot) return false;
+  if (!moved && room + 2 < kMovedValueSlot) return nullptr;
   char* target = AllocateSpare(text.size() + 1);
   // A rebuilt block lives elsewhere in memory: its slots may be out of reach.
-  if (target == nullptr || target - slot > INT32_MAX || target - slot < INT32_MIN) return false;
+  if (target == nullptr || target - slot > INT32_MAX || target - slot < INT32_MIN) return nullptr;
   std::memcpy(target, text.data(), text.size());
   target[text.size()] = '\0';
   if (!moved) {
@@ -138,7 +177,7 @@ bool Document::MoveValue(char* slot, size_t room, std::string_view text) {
   }
   int32_t offset = static_cast<int32_t>(target - slot);
   std::memcpy(slot + 1, &offset, sizeof offset);
-  return true;
+  return target;
 }
 
 // Writes a new block holding the grown values into the block arena. The old
@@ -171,6 +210,7 @@ void Document::RebuildBlock(Element& element, RewritePass& pass) {
     bool grew = next < pass.grown.size() && pass.grown[next].value == value;
     put(std::string_view(name, std::strlen(name) + 1));
     *out++ = '"';
+    if (grew && pass.originals != nullptr) pass.originals->Add(out, value);
     put(grew ? grown_value(pass.grown[next++]) : std::string_view(value));
     *out++ = '\0';
   }

@@ -1,15 +1,18 @@
 #pragma once
 
 #include <cstddef>
+#include <optional>
 #include <span>
 #include <string>
 #include <string_view>
 #include <utility>
+#include <vector>
 
 #include "platform/xml/document_storage.h"
 
 namespace zor2::xml {
 
+class Document;
 class Parser;
 
 // An element of a parsed document: a tag, attributes and child elements, all
@@ -48,6 +51,30 @@ class Element {
 // Values are zero-terminated: a rewritten text ends at its first zero byte.
 using ValueRewrite = bool (*)(std::string_view value, std::string* rewritten);
 
+// The text that values had before a rewrite changed them, found by where each
+// rewritten value now stands; values that the rewrite left alone are not in it.
+// Built by one pass, then only read: it is searched in sorted order, which
+// costs one allocation for all values rather than one per value.
+class OriginalValues {
+ public:
+  // The text `value` had before the rewrite, if the rewrite changed it.
+  // REQUIRES: the pass that filled it has ended.
+  std::optional<std::string_view> Find(const char* value) const;
+
+ private:
+  friend class Document;
+  struct Entry {
+    const char* value;
+    size_t offset;  // of the original text in text_
+    size_t length;
+  };
+  void Add(const char* value, std::string_view original);
+  void Seal();
+
+  std::vector<Entry> entries_;
+  std::string text_;
+};
+
 // A parsed XML document (read with ReadDocumentFile or ReadDocumentText): its
 // text in one buffer, parsed in place, and its elements.
 class Document {
@@ -65,7 +92,8 @@ class Document {
 
   // Applies `rewrite` to every attribute value of every element; a rewritten
   // value replaces the old one. Values read before may be changed in place.
-  void RewriteValues(ValueRewrite rewrite);
+  // With `originals`, the old text of every value that changed is kept there.
+  void RewriteValues(ValueRewrite rewrite, OriginalValues* originals = nullptr);
 
  private:
   friend class Parser;
@@ -74,8 +102,10 @@ class Document {
   // `size` bytes of the text's spare capacity, or null when it is used up.
   // Pages of a large buffer that are never used cost no memory.
   char* AllocateSpare(size_t size);
+  void RewriteAll(RewritePass& pass);
   void RewriteElement(Element& element, RewritePass& pass);
-  bool MoveValue(char* slot, size_t room, std::string_view text);
+  // Returns where the value now stands, or null when it could not move.
+  const char* MoveValue(char* slot, size_t room, std::string_view text);
   void RebuildBlock(Element& element, RewritePass& pass);
 
   TextBuffer text_;        // the document as UTF-8

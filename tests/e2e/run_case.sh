@@ -9,6 +9,8 @@
 #   expected.report.xml  when present, compared with the file out.xml
 #   expected.help.htm    when present, compared with the file help.htm (the cases
 #                        that write the help page link to ../../expected.help.htm)
+#   expected.files/NAME  when present, each compared with the file NAME that the
+#                        run wrote (exports, for example)
 #   setup.sh           when present, run (with bash) in the working copy first
 #   run_as             when present, a user name: run as root, the program runs
 #                      as that user, since file modes do not bind root
@@ -73,4 +75,7 @@ expect expected.stdout actual.stdout
 expect expected.stderr actual.stderr
 [ -f expected.report.xml ] && expect expected.report.xml out.xml
 [ -f expected.help.htm ] && expect expected.help.htm help.htm
+if [ -d expected.files ]; then
+  for expected_file in expected.files/*; do expect "$expected_file" "${expected_file#expected.files/}"; done
+fi
 exit $failed
