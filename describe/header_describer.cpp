@@ -52,7 +52,9 @@ class Tokens {
   // the source (see JoinTokens).
   std::string Join(unsigned begin, unsigned end) const {
     std::vector<std::string> spellings;
-    for (unsigned i = begin; i < end; ++i) spellings.push_back(Spelling(i));
+    for (unsigned i = begin; i < end; ++i) {
+      if (clang_getTokenKind(tokens_[i]) != CXToken_Comment) spellings.push_back(Spelling(i));
+    }
     return JoinTokens(spellings);
   }
 
@@ -90,6 +92,12 @@ CXFile ExpansionFile(CXSourceLocation location, unsigned* line = nullptr,
   return file;
 }
 
+// An extern "C" block, which libclang may show as an unexposed declaration:
+// what it holds belongs to the enclosing namespace.
+bool IsLinkageKind(CXCursorKind kind) {
+  return kind == CXCursor_LinkageSpec || kind == CXCursor_UnexposedDecl;
+}
+
 bool IsClassKind(CXCursorKind kind) {
   return kind == CXCursor_ClassDecl || kind == CXCursor_StructDecl || kind == CXCursor_UnionDecl ||
          kind == CXCursor_ClassTemplate || kind == CXCursor_ClassTemplatePartialSpecialization;
@@ -120,7 +128,7 @@ std::optional<std::string> QualifiedName(CXCursor cursor) {
     const CXCursorKind kind = clang_getCursorKind(at);
     if (kind == CXCursor_TranslationUnit) break;
     if (clang_Cursor_isNull(at) || clang_isInvalid(kind)) return std::nullopt;
-    if (kind == CXCursor_LinkageSpec) continue;
+    if (IsLinkageKind(kind)) continue;
     std::string part;
     if (kind == CXCursor_Namespace) {
       part = Take(clang_getCursorSpelling(at));
@@ -145,7 +153,7 @@ std::optional<std::string> QualifiedName(CXCursor cursor) {
 // namespace (an out-of-class member definition) or is in an anonymous one.
 std::optional<std::string> FreeFunctionClass(CXCursor function) {
   CXCursor parent = clang_getCursorSemanticParent(function);
-  while (clang_getCursorKind(parent) == CXCursor_LinkageSpec) {
+  while (IsLinkageKind(clang_getCursorKind(parent))) {
     parent = clang_getCursorSemanticParent(parent);
   }
   const CXCursorKind kind = clang_getCursorKind(parent);
@@ -414,7 +422,7 @@ class UnitDescriber {
         if (std::optional<MethodDescription> method = DescribeMethod(cursor, owner, true)) {
           owner.methods.push_back(std::move(*method));
         }
-      } else if (!in_class && (kind == CXCursor_Namespace || kind == CXCursor_LinkageSpec)) {
+      } else if (!in_class && (kind == CXCursor_Namespace || IsLinkageKind(kind))) {
         if (HeaderOf(cursor) >= 0) open.push_back({ChildrenOf(cursor)});
       } else if (!in_class &&
                  (kind == CXCursor_FunctionDecl || kind == CXCursor_FunctionTemplate)) {
