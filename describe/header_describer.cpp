@@ -640,9 +640,11 @@ UnitOutcome DescribeUnit(const std::string& dir, const std::vector<std::string>&
 
 GroupOutcome DescribeGroup(const GroupInput& input, const CompileSettings& settings,
                            unsigned threads) {
+  // One unit for the whole group, or else one per header.
   std::vector<UnitOutcome> units;
   if (!input.headers.empty()) units.push_back(DescribeUnit(input.dir, input.headers, settings));
-  if (!units.empty() && units[0].unattributed_errors) {
+  const bool per_header = !units.empty() && units[0].unattributed_errors;
+  if (per_header) {
     units.clear();
     units.resize(input.headers.size());
     std::atomic<size_t> next{0};
@@ -652,9 +654,7 @@ GroupOutcome DescribeGroup(const GroupInput& input, const CompileSettings& setti
       }
     };
     std::vector<std::thread> helpers;
-    for (unsigned t = 1; t < std::max(1u, threads) && t < input.headers.size(); ++t) {
-      helpers.emplace_back(work);
-    }
+    for (unsigned t = 1; t < threads && t < input.headers.size(); ++t) helpers.emplace_back(work);
     work();
     for (std::thread& helper : helpers) helper.join();
   }
@@ -662,8 +662,8 @@ GroupOutcome DescribeGroup(const GroupInput& input, const CompileSettings& setti
   GroupOutcome outcome;
   outcome.group.name = input.name;
   for (size_t h = 0; h < input.headers.size(); ++h) {
-    UnitOutcome& unit = units.size() == 1 ? units[0] : units[h];
-    const size_t slot = units.size() == 1 ? h : 0;
+    UnitOutcome& unit = per_header ? units[h] : units[0];
+    const size_t slot = per_header ? 0 : h;
     if (unit.files[slot]) {
       outcome.group.files.push_back(std::move(*unit.files[slot]));
     } else {
