@@ -1,10 +1,11 @@
 #!/usr/bin/env bash
-# Installs the Debian packages the build and the tests need, when they are missing.
+# Installs the Debian packages the build and the tests need, when they are missing
+# (libclang-dev for zor2describe).
 # With --fuzz, also clang and its runtimes (sanitizers, libFuzzer) for the fuzz target.
 # Idempotent; run as root on Debian 12.
 set -euo pipefail
 
-packages=(cmake g++ make libgtest-dev)
+packages=(cmake g++ make libgtest-dev libclang-dev)
 if [ "${1:-}" = "--fuzz" ]; then
   packages+=(clang libclang-rt-14-dev)
 fi

@@ -1,0 +1,116 @@
+#include "describe/describe_options.h"
+
+#include <cstring>
+#include <string_view>
+
+#include "platform/tools/argument_file.h"
+
+namespace zor2::describe {
+
+const char kDescribeUsage[] =
+    "Usage : zor2describe -framework NAME -public DIR [options] -o OUTPUT.xml\n"
+    "        zor2describe = ARGUMENT-FILE\n"
+    "Options :\n"
+    "   -framework NAME     : Framework described\n"
+    "   -public DIR         : Directory of the public headers\n"
+    "   -protected DIR      : Directory of the protected headers\n"
+    "   -I DIR              : Include directory (may be repeated)\n"
+    "   -D NAME[=VALUE]     : Macro definition (may be repeated)\n"
+    "   -std STANDARD       : Language standard (default: c++17)\n"
+    "   -default-level L1   : @ZOR2Level of headers without the tag\n"
+    "   -default-usage U1   : @ZOR2Usage of headers without the tag\n"
+    "   -o FILE             : Output file\n"
+    "   -h                  : This text\n";
+
+namespace {
+
+// Takes `value` for `option` when it is an option that wants a value.
+bool TakeValue(std::string_view option, const std::string& value, DescribeOptions* options,
+               std::vector<std::string_view>* given) {
+  if (option == "-framework") {
+    options->framework = value;
+  } else if (option == "-public") {
+    options->public_dir = value;
+  } else if (option == "-protected") {
+    options->protected_dir = value;
+  } else if (option == "-I") {
+    options->include_dirs.push_back(value);
+  } else if (option == "-D") {
+    options->defines.push_back(value);
+  } else if (option == "-std") {
+    options->standard = value;
+  } else if (option == "-default-level") {
+    options->default_level = value;
+  } else if (option == "-default-usage") {
+    options->default_usage = value;
+  } else if (option == "-o") {
+    options->output = value;
+  } else {
+    return false;
+  }
+  given->push_back(option);
+  return true;
+}
+
+bool IsKnownStandard(std::string_view standard) {
+  return standard.rfind("c++", 0) == 0 || standard.rfind("gnu++", 0) == 0;
+}
+
+}  // namespace
+
+std::optional<DescribeStatus> ReadDescribeCommandLine(int argc, const char* const* argv,
+                                                      DescribeOptions* options, std::ostream& out,
+                                                      std::ostream& err) {
+  const std::string_view program = argc > 0 && argv[0] != nullptr ? argv[0] : "zor2describe";
+  std::vector<std::string> items;
+  if (argc == 3 && std::strcmp(argv[1], "=") == 0) {
+    std::string reason;
+    if (!ReadArgumentFile(argv[2], &items, &reason)) {
+      err << program << ": unable to read file " << argv[2] << ": " << reason << '\n';
+      return DescribeStatus::kUsageError;
+    }
+  }
+  // An argument file without any item counts as no argument file.
+  if (items.empty()) items.assign(argv + (argc > 0 ? 1 : 0), argv + argc);
+
+  bool failed = false;
+  std::vector<std::string_view> given;
+  for (size_t i = 0; i < items.size(); ++i) {
+    const std::string& item = items[i];
+    // A stray word makes the rest of the line meaningless: stop at once.
+    if (item.empty() || item[0] != '-') {
+      err << program << ": unexpected token [" << item << "]\n";
+      failed = true;
+      break;
+    }
+    if (item == "-h") {
+      out << kDescribeUsage;
+      return DescribeStatus::kDone;
+    }
+    if (i + 1 < items.size() && TakeValue(item, items[i + 1], options, &given)) {
+      ++i;
+      continue;
+    }
+    err << program << ": Unknown option or missing arguments " << item << '\n';
+    failed = true;
+  }
+  for (std::string_view required : {"-framework", "-public", "-o"}) {
+    bool found = false;
+    for (std::string_view option : given) found = found || option == required;
+    if (found) continue;
+    err << program << ": Option " << required << " missing\n";
+    failed = true;
+  }
+  if (!IsKnownStandard(options->standard)) {
+    err << program << ": -std wants a C++ standard such as c++17, not " << options->standard
+        << '\n';
+    failed = true;
+  }
+  if (failed) {
+    err << kDescribeUsage;
+    return DescribeStatus::kUsageError;
+  }
+  return std::nullopt;
+}
+
+}  // namespace zor2::describe

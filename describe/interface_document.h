@@ -1,0 +1,16 @@
+#pragma once
+
+#include <memory>
+
+#include "describe/interface_model.h"
+#include "platform/xml/output_element.h"
+
+namespace zor2::describe {
+
+// The interface description document of `framework`: a "Workspace" root, one
+// "Framework", its "Interfaces" groups, their "File", "Class", "Method" and
+// "Arg" elements in the order of the description, each with the attributes
+// that zor2check reads (optional ones only when they have a value).
+std::unique_ptr<xml::OutputElement> BuildDocument(const FrameworkDescription& framework);
+
+}  // namespace zor2::describe

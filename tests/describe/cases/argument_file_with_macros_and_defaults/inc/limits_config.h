@@ -1,0 +1,2 @@
+#pragma once
+#define LIB_EXPORT

@@ -1,0 +1,7 @@
+#pragma once
+namespace app {
+class Bad {
+ public:
+  Widget Make();
+};
+}  // namespace app

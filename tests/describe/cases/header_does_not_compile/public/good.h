@@ -1,0 +1,7 @@
+#pragma once
+namespace app {
+class Good {
+ public:
+  void Run();
+};
+}  // namespace app

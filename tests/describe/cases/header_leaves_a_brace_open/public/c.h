@@ -1,0 +1,4 @@
+#pragma once
+struct Last {
+  void Three();
+};

@@ -1,0 +1,14 @@
+// @ZOR2Level L2
+// @ZOR2Usage U3
+#pragma once
+
+#include <string>
+
+namespace shapes {
+
+struct Style {
+  std::string Font() const;
+  int Weight() const;
+};
+
+}  // namespace shapes

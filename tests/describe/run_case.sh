@@ -1,0 +1,68 @@
+#!/usr/bin/env bash
+# Runs one zor2describe case: a folder holding the commands to run, their inputs, and what is
+# expected of them.
+#
+#   steps              one command per line: "zor2describe" or "zor2check", then its arguments
+#                      separated by blanks (paths relative to the folder); "#" starts a comment
+#   expected.status    the exit status of each step, one per line (all 0 when absent)
+#   expected.stdout    standard output of all the steps (empty when absent)
+#   expected.stderr    standard error of all the steps (empty when absent)
+#   expected.NAME      any other expected file is compared with the file NAME that the steps
+#                      wrote (expected.out.xml with out.xml, expected.report.xml with report.xml)
+#
+# The case runs in a fresh copy of its folder (links followed, so that cases share the test
+# library through a link), with each program named as in the steps whatever its path, and every
+# expected file must match byte for byte.
+set -u
+describe_bin=$(realpath "$1")
+check_bin=$(realpath "$2")
+case_dir=$3
+
+work=$(mktemp -d)
+trap 'rm -rf "$work"' EXIT
+cp -RL "$case_dir/." "$work/"
+cd "$work" || exit 1
+
+: >actual.stdout
+: >actual.stderr
+: >actual.status
+while read -r program arguments; do
+  case "$program" in
+    "" | "#"*) continue ;;
+    zor2describe) bin=$describe_bin ;;
+    zor2check) bin=$check_bin ;;
+    *)
+      echo "--- unknown program in steps: $program"
+      exit 1
+      ;;
+  esac
+  read -r -a args <<<"$arguments"
+  (bash -c 'exec -a "$0" "$1" "${@:2}"' "$program" "$bin" "${args[@]}") \
+    >>actual.stdout 2>>actual.stderr </dev/null
+  echo $? >>actual.status
+done <steps
+
+failed=0
+expect() { # expect <expected file> <actual file>
+  local expected=$1 actual=$2
+  if [ ! -e "$actual" ]; then
+    echo "--- $actual was not written"
+    failed=1
+  elif ! cmp -s "$expected" "$actual"; then
+    echo "--- $actual differs from $expected:"
+    diff -u "$expected" "$actual" | head -n 80
+    failed=1
+  fi
+}
+
+[ -f expected.status ] || sed 's/.*/0/' actual.status >expected.status
+[ -f expected.stdout ] || : >expected.stdout
+[ -f expected.stderr ] || : >expected.stderr
+for expected in expected.*; do
+  name=${expected#expected.}
+  case "$name" in
+    status | stdout | stderr) expect "$expected" "actual.$name" ;;
+    *) expect "$expected" "$name" ;;
+  esac
+done
+exit $failed
