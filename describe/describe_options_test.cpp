@@ -4,7 +4,7 @@
 
 #include <sstream>
 
-#include "tests/TempDir.h"
+#include "tests/test_util.h"
 
 namespace zor2::describe {
 namespace {
@@ -86,7 +86,7 @@ TEST(ReadDescribeCommandLine, HelpWinsUnlessTakenAsAValue) {
   EXPECT_EQ(value.options.framework, "-h");
 }
 
-class ArgumentFileTest : public TempDirTest {};
+class ArgumentFileTest : public testing::TempDirTest {};
 
 TEST_F(ArgumentFileTest, ItemsComeFromTheFile) {
   const std::string path =

@@ -4,7 +4,7 @@
 
 #include <filesystem>
 
-#include "tests/TempDir.h"
+#include "tests/test_util.h"
 
 namespace zor2::describe {
 namespace {
@@ -18,7 +18,7 @@ TEST(IsHeaderName, KnowsTheHeaderExtensions) {
   }
 }
 
-class ListHeadersTest : public TempDirTest {};
+class ListHeadersTest : public testing::TempDirTest {};
 
 TEST_F(ListHeadersTest, ListsHeadersOfEveryLevelSortedBytewise) {
   std::filesystem::create_directories(dir_ / "pub/geo/detail");
