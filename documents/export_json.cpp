@@ -1,0 +1,83 @@
+#include "documents/export_json.h"
+
+#include "documents/export_text.h"
+#include "documents/json_writer.h"
+
+namespace zor2 {
+
+namespace {
+
+void WriteSummary(const RunSummary& summary, JsonWriter& json) {
+  json.BeginObject();
+  json.Member("verdict", summary.failed ? "failed" : "passed");
+  const int total = TotalFindings(summary);
+  json.Member("findings", total);
+  json.Member("new", total - summary.accepted);
+  json.Member("accepted", summary.accepted);
+  json.Key("counts_by_code");
+  json.BeginObject();
+  for (const MessageType& type : kMessageTypes) {
+    json.Member(type.id, summary.counts_by_code[static_cast<size_t>(type.code)]);
+  }
+  json.EndObject();
+  json.Member("files", summary.files);
+  json.Member("frameworks", summary.frameworks);
+  json.Member("pairs_compared", summary.pairs_compared);
+  json.Member("pairs_skipped", summary.pairs_skipped);
+  json.Member("missing_counterparts", summary.missing_counterparts);
+  json.Member("stale_baseline_entries", summary.stale_baseline_entries);
+  json.EndObject();
+}
+
+void WriteFinding(const Finding& finding, JsonWriter& json) {
+  const MessageType& type = MessageTypeOf(finding.code);
+  json.BeginObject();
+  json.Member("code", type.id);
+  json.Member("full_name", type.full_name);
+  json.Member("framework", finding.framework);
+  json.Member("group", finding.group);
+  json.Member("file", finding.file);
+  json.Member("class", finding.class_name);
+  json.Member("method", finding.method);
+  json.Member("signature", finding.signature);
+  json.Member("argument", finding.argument);
+  json.Member("reference_value", finding.reference_value);
+  json.Member("checked_value", finding.checked_value);
+  json.Member("accepted", finding.accepted);
+  json.Member("reason", finding.reason);
+  json.EndObject();
+}
+
+}  // namespace
+
+std::string ExportJson(const RunDescription& run, const RunSummary& summary,
+                       const std::vector<Finding>& findings) {
+  std::string out;
+  out.reserve(1024 + findings.size() * 512);
+  JsonWriter json(&out);
+  json.BeginObject();
+  json.Member("format_version", 1);
+  json.Key("tool");
+  json.BeginObject();
+  json.Member("name", "zor2check");
+  json.Member("version", run.tool_version);
+  json.EndObject();
+  json.Key("run");
+  json.BeginObject();
+  json.Member("reference", run.reference);
+  json.Member("checked", run.checked);
+  json.Member("report", run.report);
+  json.Member("options", run.options);
+  json.EndObject();
+  json.Key("summary");
+  WriteSummary(summary, json);
+  json.Key("findings");
+  json.BeginArray();
+  for (const Finding& finding : findings) WriteFinding(finding, json);
+  json.EndArray();
+  json.EndObject();
+  out.push_back('\n');
+  return out;
+}
+
+}  // namespace zor2

@@ -1,0 +1,234 @@
+#include "documents/export_text.h"
+
+#include <unordered_map>
+#include <utility>
+
+namespace zor2 {
+
+namespace {
+
+constexpr std::string_view kReplacementCharacter = "\xEF\xBF\xBD";
+
+// The length of the UTF-8 sequence that starts at `text[i]`, or 0 when the
+// bytes there are not one.
+size_t Utf8SequenceLength(std::string_view text, size_t i) {
+  const auto lead = static_cast<unsigned char>(text[i]);
+  if (lead < 0x80) return 1;
+  size_t length = 0;
+  unsigned char low = 0x80;
+  unsigned char high = 0xBF;
+  if (lead >= 0xC2 && lead <= 0xDF) {
+    length = 2;
+  } else if (lead >= 0xE0 && lead <= 0xEF) {
+    length = 3;
+    if (lead == 0xE0) low = 0xA0;   // overlong
+    if (lead == 0xED) high = 0x9F;  // surrogates
+  } else if (lead >= 0xF0 && lead <= 0xF4) {
+    length = 4;
+    if (lead == 0xF0) low = 0x90;   // overlong
+    if (lead == 0xF4) high = 0x8F;  // beyond U+10FFFF
+  } else {
+    return 0;
+  }
+  if (i + length > text.size()) return 0;
+  const auto second = static_cast<unsigned char>(text[i + 1]);
+  if (second < low || second > high) return 0;
+  for (size_t k = 2; k < length; ++k) {
+    if ((static_cast<unsigned char>(text[i + k]) & 0xC0) != 0x80) return 0;
+  }
+  return length;
+}
+
+// Calls `ascii(c)` for each ASCII character of `text` and appends every other
+// valid sequence, or U+FFFD for each byte that starts none, to `out`.
+template <typename Ascii>
+void ForEachCharacter(std::string_view text, std::string* out, Ascii ascii) {
+  for (size_t i = 0; i < text.size();) {
+    const size_t length = Utf8SequenceLength(text, i);
+    if (length == 1) {
+      ascii(text[i]);
+      ++i;
+    } else if (length == 0) {
+      out->append(kReplacementCharacter);
+      ++i;
+    } else {
+      out->append(text.substr(i, length));
+      i += length;
+    }
+  }
+}
+
+}  // namespace
+
+void AppendValidUtf8(std::string_view text, std::string* out) {
+  ForEachCharacter(text, out, [out](char c) { out->push_back(c); });
+}
+
+void AppendJsonString(std::string_view text, std::string* out) {
+  static constexpr char kHex[] = "0123456789abcdef";
+  out->push_back('"');
+  ForEachCharacter(text, out, [out](char c) {
+    switch (c) {
+      case '"':
+        out->append("\\\"");
+        break;
+      case '\\':
+        out->append("\\\\");
+        break;
+      case '\n':
+        out->append("\\n");
+        break;
+      case '\r':
+        out->append("\\r");
+        break;
+      case '\t':
+        out->append("\\t");
+        break;
+      default:
+        if (static_cast<unsigned char>(c) < 0x20) {
+          out->append("\\u00");
+          out->push_back(kHex[(c >> 4) & 0xF]);
+          out->push_back(kHex[c & 0xF]);
+        } else {
+          out->push_back(c);
+        }
+    }
+  });
+  out->push_back('"');
+}
+
+void AppendHtmlEscaped(std::string_view text, std::string* out) {
+  ForEachCharacter(text, out, [out](char c) {
+    switch (c) {
+      case '&':
+        out->append("&amp;");
+        break;
+      case '<':
+        out->append("&lt;");
+        break;
+      case '>':
+        out->append("&gt;");
+        break;
+      case '"':
+        out->append("&quot;");
+        break;
+      case '\'':
+        out->append("&#39;");
+        break;
+      default:
+        out->push_back(c);
+    }
+  });
+}
+
+std::string HelpAsText(std::string_view help) {
+  static constexpr std::pair<std::string_view, std::string_view> kTags[] = {
+      {"<BR>", "\n"}, {"<PRE>", "\n"}, {"</PRE>", ""}};
+  std::string text;
+  for (size_t i = 0; i < help.size();) {
+    bool replaced = false;
+    for (const auto& [tag, replacement] : kTags) {
+      if (help.substr(i, tag.size()) == tag) {
+        text.append(replacement);
+        i += tag.size();
+        replaced = true;
+        break;
+      }
+    }
+    if (!replaced) text.push_back(help[i++]);
+  }
+  while (!text.empty() && (text.back() == '\n' || text.back() == ' ')) text.pop_back();
+  return text;
+}
+
+std::string CountOf(int count, std::string_view noun) {
+  std::string text = std::to_string(count);
+  text += ' ';
+  text += noun;
+  if (count != 1) text += 's';
+  return text;
+}
+
+std::string VerdictLine(const RunSummary& summary) {
+  const int total = TotalFindings(summary);
+  const int fresh = total - summary.accepted;
+  std::string accepted;
+  if (summary.accepted > 0) {
+    accepted = " (" + std::to_string(summary.accepted) + " accepted by the baseline)";
+  }
+  if (summary.failed) return "FAILED: " + CountOf(fresh, "new finding") + accepted;
+  if (total == 0) return "PASSED: no finding";
+  if (fresh == 0) return "PASSED: " + CountOf(total, "finding") + ", all accepted by the baseline";
+  return "PASSED: " + CountOf(total, "finding") + accepted;
+}
+
+std::string ScopeLine(const RunSummary& summary) {
+  std::string line = CountOf(TotalFindings(summary), "finding");
+  line += " in " + CountOf(summary.files, "file") + " of " +
+          CountOf(summary.frameworks, "framework") + "; ";
+  line += CountOf(summary.pairs_compared, "document pair") + " compared, " +
+          std::to_string(summary.pairs_skipped) + " skipped for an error.";
+  return line;
+}
+
+std::vector<std::string> SummaryNotes(const RunSummary& summary) {
+  std::vector<std::string> notes;
+  if (summary.pairs_skipped > 0) {
+    notes.push_back(CountOf(summary.pairs_skipped, "document pair") +
+                    " could not be compared: an input could not be read or parsed, so findings "
+                    "may be missing.");
+  }
+  if (!summary.missing_counterparts.empty()) {
+    std::string note = "Reference documents without a checked counterpart, not compared: ";
+    for (size_t i = 0; i < summary.missing_counterparts.size(); ++i) {
+      if (i > 0) note += ", ";
+      note += summary.missing_counterparts[i];
+    }
+    notes.push_back(note + ".");
+  }
+  if (summary.stale_baseline_entries > 0) {
+    const int stale = summary.stale_baseline_entries;
+    notes.push_back(std::to_string(stale) + (stale == 1 ? " baseline entry" : " baseline entries") +
+                    " matched no finding of this run.");
+  }
+  return notes;
+}
+
+std::string PlaceInFile(const Finding& finding) {
+  std::string place;
+  auto add = [&place](std::string_view part) {
+    if (part.empty()) return;
+    if (!place.empty()) place += ", ";
+    place += part;
+  };
+  if (!finding.class_name.empty()) add("class " + finding.class_name);
+  add(finding.signature.empty() ? finding.method : finding.signature);
+  add(finding.argument);
+  return place;
+}
+
+std::vector<FrameworkFindings> GroupByFrameworkAndFile(const std::vector<Finding>& findings) {
+  std::vector<FrameworkFindings> frameworks;
+  std::unordered_map<std::string, size_t> framework_index;
+  // Per framework, the index of each file, keyed by group and name.
+  std::vector<std::unordered_map<std::string, size_t>> file_index;
+  for (const Finding& finding : findings) {
+    auto [framework_it, new_framework] =
+        framework_index.try_emplace(finding.framework, frameworks.size());
+    if (new_framework) {
+      frameworks.push_back({finding.framework, {}});
+      file_index.emplace_back();
+    }
+    FrameworkFindings& framework = frameworks[framework_it->second];
+    std::string file_key = finding.group;
+    file_key += '\0';
+    file_key += finding.file;
+    auto [file_it, new_file] =
+        file_index[framework_it->second].try_emplace(file_key, framework.files.size());
+    if (new_file) framework.files.push_back({finding.group, finding.file, {}});
+    framework.files[file_it->second].findings.push_back(&finding);
+  }
+  return frameworks;
+}
+
+}  // namespace zor2
