@@ -5,6 +5,8 @@
 set -euo pipefail
 
 packages=(cmake g++ make libgtest-dev)
+# The export tests: schema validation, Markdown rendering, the HTML page in a browser.
+packages+=(python3 python3-jsonschema cmark-gfm chromium)
 if [ "${1:-}" = "--fuzz" ]; then
   packages+=(clang libclang-rt-14-dev)
 fi
