@@ -1,5 +1,6 @@
 #include "documents/export_html.h"
 
+#include <array>
 #include <string_view>
 #include <unordered_map>
 
@@ -160,6 +161,16 @@ class Page {
   std::string* out_;
 };
 
+// The help texts as plain text, in the table's order, made once.
+const std::array<std::string, kMessageTypes.size()>& HelpTexts() {
+  static const auto texts = [] {
+    std::array<std::string, kMessageTypes.size()> help;
+    for (size_t i = 0; i < help.size(); ++i) help[i] = HelpAsText(kMessageTypes[i].help);
+    return help;
+  }();
+  return texts;
+}
+
 void WriteValueCell(Page& page, const std::string& value) {
   page << "<td>";
   if (value.empty()) {
@@ -209,7 +220,7 @@ void WriteFinding(Page& page, const Finding& finding, size_t index) {
     page << "</p>\n";
   }
   page << "<p class=\"help\">";
-  page.Text(HelpAsText(type.help)) << "</p>\n</article>\n";
+  page.Text(HelpTexts()[static_cast<size_t>(finding.code)]) << "</p>\n</article>\n";
 }
 
 // The findings of one file: those on the file itself first, then one section

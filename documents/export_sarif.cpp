@@ -76,6 +76,21 @@ uint64_t Fnv1a(std::string_view bytes) {
   return hash;
 }
 
+// The fingerprint of the finding whose chain key is `key`: its hash in 16
+// hexadecimal digits, and ":" and the rank for the second and later findings
+// with that key.
+std::string Fingerprint(std::string_view key, int occurrence) {
+  static constexpr char kHex[] = "0123456789abcdef";
+  uint64_t hash = Fnv1a(key);
+  std::string fingerprint(16, '0');
+  for (int i = 15; i >= 0; --i, hash >>= 4) fingerprint[i] = kHex[hash & 0xF];
+  if (occurrence > 1) {
+    fingerprint += ':';
+    fingerprint += std::to_string(occurrence);
+  }
+  return fingerprint;
+}
+
 std::string LogicalName(const Finding& finding) {
   if (!finding.argument.empty()) return finding.argument;
   if (!finding.method.empty()) return finding.method;
@@ -166,7 +181,7 @@ void WriteLocation(const Finding& finding, JsonWriter& json) {
   json.EndArray();
 }
 
-void WriteResult(const Finding& finding, int occurrence, JsonWriter& json) {
+void WriteResult(const Finding& finding, const std::string& fingerprint, JsonWriter& json) {
   const MessageType& type = MessageTypeOf(finding.code);
   json.BeginObject();
   json.Member("ruleId", type.id);
@@ -180,7 +195,7 @@ void WriteResult(const Finding& finding, int occurrence, JsonWriter& json) {
   WriteLocation(finding, json);
   json.Key("partialFingerprints");
   json.BeginObject();
-  json.Member("zor2checkFinding/v1", FindingFingerprint(finding, occurrence));
+  json.Member("zor2checkFinding/v1", fingerprint);
   json.EndObject();
   if (finding.accepted) {
     json.Key("suppressions");
@@ -228,15 +243,7 @@ void WriteRunProperties(const RunDescription& run, const RunSummary& summary, Js
 }  // namespace
 
 std::string FindingFingerprint(const Finding& finding, int occurrence) {
-  static constexpr char kHex[] = "0123456789abcdef";
-  uint64_t hash = Fnv1a(ChainKey(finding));
-  std::string fingerprint(16, '0');
-  for (int i = 15; i >= 0; --i, hash >>= 4) fingerprint[i] = kHex[hash & 0xF];
-  if (occurrence > 1) {
-    fingerprint += ':';
-    fingerprint += std::to_string(occurrence);
-  }
-  return fingerprint;
+  return Fingerprint(ChainKey(finding), occurrence);
 }
 
 std::string ExportSarif(const RunDescription& run, const RunSummary& summary,
@@ -269,8 +276,11 @@ std::string ExportSarif(const RunDescription& run, const RunSummary& summary,
   json.Key("results");
   json.BeginArray();
   std::unordered_map<std::string, int> seen;
+  seen.reserve(findings.size());
   for (const Finding& finding : findings) {
-    WriteResult(finding, ++seen[ChainKey(finding)], json);
+    std::string key = ChainKey(finding);
+    const int occurrence = ++seen[key];
+    WriteResult(finding, Fingerprint(key, occurrence), json);
   }
   json.EndArray();
   json.Key("properties");

@@ -39,86 +39,96 @@ size_t Utf8SequenceLength(std::string_view text, size_t i) {
   return length;
 }
 
-// Calls `ascii(c)` for each ASCII character of `text` and appends every other
-// valid sequence, or U+FFFD for each byte that starts none, to `out`.
-template <typename Ascii>
-void ForEachCharacter(std::string_view text, std::string* out, Ascii ascii) {
+// Appends `text` to `out`: runs of ASCII characters for which `special` is
+// false as they are, each ASCII character for which it is true through
+// `escape(c)`, every other valid UTF-8 sequence as it is and U+FFFD for each
+// byte that starts none. Runs are copied whole: escaping is on the way of
+// every export and most text needs none.
+template <typename Special, typename Escape>
+void AppendEscapedUtf8(std::string_view text, std::string* out, Special special, Escape escape) {
+  size_t run = 0;
   for (size_t i = 0; i < text.size();) {
-    const size_t length = Utf8SequenceLength(text, i);
-    if (length == 1) {
-      ascii(text[i]);
+    const auto byte = static_cast<unsigned char>(text[i]);
+    if (byte < 0x80 && !special(text[i])) {
       ++i;
-    } else if (length == 0) {
+      continue;
+    }
+    out->append(text.substr(run, i - run));
+    if (byte < 0x80) {
+      escape(text[i]);
+      ++i;
+    } else if (const size_t length = Utf8SequenceLength(text, i); length == 0) {
       out->append(kReplacementCharacter);
       ++i;
     } else {
       out->append(text.substr(i, length));
       i += length;
     }
+    run = i;
   }
+  out->append(text.substr(run));
 }
 
 }  // namespace
 
 void AppendValidUtf8(std::string_view text, std::string* out) {
-  ForEachCharacter(text, out, [out](char c) { out->push_back(c); });
+  AppendEscapedUtf8(
+      text, out, [](char) { return false; }, [](char) {});
 }
 
 void AppendJsonString(std::string_view text, std::string* out) {
   static constexpr char kHex[] = "0123456789abcdef";
   out->push_back('"');
-  ForEachCharacter(text, out, [out](char c) {
-    switch (c) {
-      case '"':
-        out->append("\\\"");
-        break;
-      case '\\':
-        out->append("\\\\");
-        break;
-      case '\n':
-        out->append("\\n");
-        break;
-      case '\r':
-        out->append("\\r");
-        break;
-      case '\t':
-        out->append("\\t");
-        break;
-      default:
-        if (static_cast<unsigned char>(c) < 0x20) {
-          out->append("\\u00");
-          out->push_back(kHex[(c >> 4) & 0xF]);
-          out->push_back(kHex[c & 0xF]);
-        } else {
-          out->push_back(c);
+  AppendEscapedUtf8(
+      text, out,
+      [](char c) { return c == '"' || c == '\\' || static_cast<unsigned char>(c) < 0x20; },
+      [out](char c) {
+        switch (c) {
+          case '"':
+            out->append("\\\"");
+            break;
+          case '\\':
+            out->append("\\\\");
+            break;
+          case '\n':
+            out->append("\\n");
+            break;
+          case '\r':
+            out->append("\\r");
+            break;
+          case '\t':
+            out->append("\\t");
+            break;
+          default:
+            out->append("\\u00");
+            out->push_back(kHex[(c >> 4) & 0xF]);
+            out->push_back(kHex[c & 0xF]);
         }
-    }
-  });
+      });
   out->push_back('"');
 }
 
 void AppendHtmlEscaped(std::string_view text, std::string* out) {
-  ForEachCharacter(text, out, [out](char c) {
-    switch (c) {
-      case '&':
-        out->append("&amp;");
-        break;
-      case '<':
-        out->append("&lt;");
-        break;
-      case '>':
-        out->append("&gt;");
-        break;
-      case '"':
-        out->append("&quot;");
-        break;
-      case '\'':
-        out->append("&#39;");
-        break;
-      default:
-        out->push_back(c);
-    }
-  });
+  AppendEscapedUtf8(
+      text, out, [](char c) { return c == '&' || c == '<' || c == '>' || c == '"' || c == '\''; },
+      [out](char c) {
+        switch (c) {
+          case '&':
+            out->append("&amp;");
+            break;
+          case '<':
+            out->append("&lt;");
+            break;
+          case '>':
+            out->append("&gt;");
+            break;
+          case '"':
+            out->append("&quot;");
+            break;
+          default:
+            out->append("&#39;");
+        }
+      });
 }
 
 std::string HelpAsText(std::string_view help) {

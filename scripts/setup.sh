@@ -1,11 +1,16 @@
 #!/usr/bin/env bash
-# Installs the Debian packages the build and the tests need, when they are missing
-# (libclang-dev for zor2describe).
-# With --fuzz, also clang and its runtimes (sanitizers, libFuzzer) for the fuzz target.
+# Installs the Debian packages the build needs, when they are missing (libclang-dev for
+# zor2describe). With --test, also what the tests of the exports need (a JSON Schema
+# validator, a Markdown renderer, Chromium); with --fuzz, clang and its runtimes
+# (sanitizers, libFuzzer) for the fuzz target.
 # Idempotent; run as root on Debian 12.
 set -euo pipefail
 
 packages=(cmake g++ make libgtest-dev libclang-dev)
+if [ "${1:-}" = "--test" ]; then
+  # The export tests: schema validation, Markdown rendering, the HTML page in a browser.
+  packages+=(python3 python3-jsonschema cmark-gfm chromium)
+fi
 if [ "${1:-}" = "--fuzz" ]; then
   packages+=(clang libclang-rt-14-dev)
 fi

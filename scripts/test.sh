@@ -20,7 +20,7 @@ if [ "${1:-}" = "--fuzz" ]; then
   exit 0
 fi
 
-bash scripts/setup.sh
+bash scripts/setup.sh --test
 
 build_dir=build
 cmake_args=(-DCMAKE_BUILD_TYPE=Release)
