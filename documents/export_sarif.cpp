@@ -250,7 +250,9 @@ std::string ExportSarif(const RunDescription& run, const RunSummary& summary,
                         const std::vector<Finding>& findings) {
   std::string out;
   out.reserve(16384 + findings.size() * 1024);
-  JsonWriter json(&out);
+  // Code-scanning services read it, people hardly: compact, as SARIF files
+  // of many results usually are.
+  JsonWriter json(&out, JsonWriter::Layout::kCompact);
   json.BeginObject();
   json.Member("$schema", kSchema);
   json.Member("version", "2.1.0");

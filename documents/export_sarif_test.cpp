@@ -48,8 +48,8 @@ TEST(ExportSarifTest, FingerprintsDoNotDependOnTheOrderOfOtherFindings) {
   const std::string forward = ExportSarif({}, {}, {a, b});
   const std::string backward = ExportSarif({}, {}, {b, a});
   for (const std::string& sarif : {forward, backward}) {
-    EXPECT_NE(sarif.find("\"zor2checkFinding/v1\": \"" + fingerprint_a + "\""), std::string::npos);
-    EXPECT_NE(sarif.find("\"zor2checkFinding/v1\": \"" + fingerprint_b + "\""), std::string::npos);
+    EXPECT_NE(sarif.find("\"zor2checkFinding/v1\":\"" + fingerprint_a + "\""), std::string::npos);
+    EXPECT_NE(sarif.find("\"zor2checkFinding/v1\":\"" + fingerprint_b + "\""), std::string::npos);
   }
   // Two findings with the same place (two classes of one name) differ by rank.
   const std::string twice = ExportSarif({}, {}, {a, a});
@@ -67,10 +67,10 @@ TEST(ExportSarifTest, AcceptedFindingsAreSuppressedWithTheirReason) {
   ASSERT_NE(suppressions, std::string::npos);
   EXPECT_EQ(sarif.find("\"suppressions\"", suppressions + 1), std::string::npos);
   // The suppression belongs to the accepted finding, which comes first.
-  const size_t second_result = sarif.find("\"ruleId\": \"MRTHC\"");
+  const size_t second_result = sarif.find("\"ruleId\":\"MRTHC\"");
   EXPECT_LT(suppressions, second_result);
-  for (const char* member : {"\"kind\": \"external\"", "\"status\": \"accepted\"",
-                             "\"justification\": \"Replaced by \\\"Halt\\\"\""}) {
+  for (const char* member : {"\"kind\":\"external\"", "\"status\":\"accepted\"",
+                             "\"justification\":\"Replaced by \\\"Halt\\\"\""}) {
     const size_t at = sarif.find(member, suppressions);
     EXPECT_LT(at, second_result) << member;
   }

@@ -10,15 +10,17 @@ void JsonWriter::BeforeValue() {
     return;
   }
   if (empty_.empty()) return;
-  out_->append(empty_.back() ? "\n" : ",\n");
+  if (!empty_.back()) out_->push_back(',');
   empty_.back() = false;
+  if (!indented_) return;
+  out_->push_back('\n');
   out_->append(2 * empty_.size(), ' ');
 }
 
 void JsonWriter::Close(char bracket) {
   const bool was_empty = empty_.back();
   empty_.pop_back();
-  if (!was_empty) {
+  if (!was_empty && indented_) {
     out_->push_back('\n');
     out_->append(2 * empty_.size(), ' ');
   }
@@ -48,7 +50,7 @@ void JsonWriter::EndArray() {
 void JsonWriter::Key(std::string_view key) {
   BeforeValue();
   AppendJsonString(key, out_);
-  out_->append(": ");
+  out_->append(indented_ ? ": " : ":");
   after_key_ = true;
 }
 

@@ -6,12 +6,15 @@
 
 namespace zor2 {
 
-// Writes indented JSON to a string: each member and element on its own line,
-// two spaces per level. The caller keeps the calls balanced and calls Key
-// before each member's value.
+// Writes JSON to a string, indented (each member and element on its own line,
+// two spaces per level) or, for large files that only tools read, compact.
+// The caller keeps the calls balanced and calls Key before each member's
+// value.
 class JsonWriter {
  public:
-  explicit JsonWriter(std::string* out) : out_(out) {}
+  enum class Layout { kIndented, kCompact };
+  explicit JsonWriter(std::string* out, Layout layout = Layout::kIndented)
+      : out_(out), indented_(layout == Layout::kIndented) {}
 
   void BeginObject();
   void EndObject();
@@ -43,6 +46,7 @@ class JsonWriter {
   void Close(char bracket);
 
   std::string* out_;
+  bool indented_;
   std::vector<bool> empty_;  // per open object or array: nothing in it yet
   bool after_key_ = false;
 };

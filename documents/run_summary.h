@@ -23,7 +23,7 @@ struct RunSummary {
   int accepted = 0;
   int stale_baseline_entries = 0;
   int not_accepted = 0;
-  bool failed = false;  // -fail was given and a finding is not accepted
+  bool failed = false;  // the verdict: a finding is not accepted (what -fail fails on)
 };
 
 // What was run, for the exports.

@@ -31,13 +31,6 @@ constexpr Rewrite kRewrites[] = {
     {{"QEXDOUBLE128"}, 1, "long double"},
 };
 
-// Every row needs "long" in the text, except the last, which needs
-// "QEXDOUBLE128"; nearly every attribute value has neither.
-bool MayNeedRewriting(std::string_view value) {
-  return value.find("long") != std::string_view::npos ||
-         value.find("QEXDOUBLE128") != std::string_view::npos;
-}
-
 // The words that the rows look for, one bit each in a word set.
 constexpr std::string_view kRowWords[] = {"long", "unsigned", "signed",
                                           "int",  "double",   "QEXDOUBLE128"};
@@ -105,7 +98,7 @@ const std::array<unsigned, std::size(kRewrites)>& RowWordsNeeded() {
 // passed over. A replacement may bring row words in ("long double" is parked
 // and restored), which then count as held.
 bool NormalizeTypeNames(std::string_view value, std::string* rewritten) {
-  if (!MayNeedRewriting(value)) return false;
+  if (!MayNormalizeTypeNames(value)) return false;
   const RowWordSpan span = FindRowWords(value);
   if (span.held == 0) return false;
   std::string text(value.substr(span.begin, span.end - span.begin));
@@ -126,6 +119,13 @@ bool NormalizeTypeNames(std::string_view value, std::string* rewritten) {
   *rewritten += text;
   *rewritten += value.substr(span.end);
   return true;
+}
+
+// Every row needs "long" in the text, except the last, which needs
+// "QEXDOUBLE128"; nearly every attribute value has neither.
+bool MayNormalizeTypeNames(std::string_view value) {
+  return value.find("long") != std::string_view::npos ||
+         value.find("QEXDOUBLE128") != std::string_view::npos;
 }
 
 }  // namespace zor2

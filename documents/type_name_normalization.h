@@ -17,4 +17,8 @@ namespace zor2 {
 // substring search, without copying.
 bool NormalizeTypeNames(std::string_view value, std::string* rewritten);
 
+// False for a value that NormalizeTypeNames surely leaves as it is: one that
+// holds neither "long" nor "QEXDOUBLE128".
+bool MayNormalizeTypeNames(std::string_view value);
+
 }  // namespace zor2

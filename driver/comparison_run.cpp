@@ -64,14 +64,16 @@ class ComparisonRun {
   ExitStatus Run() {
     ReadBaseline();
     CompareInputs();
-    if (discarding_.valid()) discarding_.get();
     AcceptBaselineFindings();
+    std::vector<std::future<std::string>> exports = StartExports();
     WriteReport();
     WriteHelpPage();
-    WriteExports();
+    FinishExports(exports);
+    // The last pair's documents are freed while the outputs are written.
+    if (discarding_.valid()) discarding_.get();
     if (config_.summary) log_.Progress() << SummaryLine(summary_);
     if (incomplete_) return ExitStatus::kIncomplete;
-    if (summary_.failed) return ExitStatus::kFindingsNotAccepted;
+    if (config_.fail && summary_.failed) return ExitStatus::kFindingsNotAccepted;
     return ExitStatus::kDone;
   }
 
@@ -221,17 +223,36 @@ class ComparisonRun {
       summary_.stale_baseline_entries = static_cast<int>(stale.size());
     }
     CountFindings(findings_, &summary_);
-    summary_.failed = config_.fail && summary_.not_accepted > 0;
+    summary_.failed = summary_.not_accepted > 0;
   }
 
-  void WriteExports() {
-    if (config_.export_paths.empty()) return;
-    RunDescription run{kToolVersion, config_.reference_path, config_.checked_path,
-                       config_.output_path, config_.items};
+  // Each export is made and written on a thread of its own while the report
+  // is written; they only read the findings, which no longer change. Each
+  // task answers why its export could not be written, or nothing.
+  std::vector<std::future<std::string>> StartExports() {
+    std::vector<std::future<std::string>> exports;
+    if (config_.export_paths.empty()) return exports;
+    run_ = RunDescription{kToolVersion, config_.reference_path, config_.checked_path,
+                          config_.output_path, config_.items};
     for (const std::string& path : config_.export_paths) {
-      std::string err;
-      const std::string text = ExportText(*ExportFormatOf(path), run, summary_, findings_);
-      if (!WriteFileAtomically(path, text, &err)) ReportFailure(path, err);
+      exports.push_back(RunInBackground([this, &path] {
+        std::string err;
+        if (WriteFileAtomically(path, ExportText(*ExportFormatOf(path), run_, summary_, findings_),
+                                &err)) {
+          return std::string();
+        }
+        return err.empty() ? std::string("cannot be written") : err;
+      }));
+    }
+    return exports;
+  }
+
+  // Names the exports that could not be written, in the order they were asked
+  // for.
+  void FinishExports(std::vector<std::future<std::string>>& exports) {
+    for (size_t i = 0; i < exports.size(); ++i) {
+      const std::string err = exports[i].get();
+      if (!err.empty()) ReportFailure(config_.export_paths[i], err);
     }
   }
 
@@ -263,6 +284,7 @@ class ComparisonRun {
   std::vector<Finding> findings_;
   RunSummary summary_;
   std::optional<Baseline> baseline_;
+  RunDescription run_;  // what the exports say was run
   bool incomplete_ = false;
   std::future<void> discarding_;  // frees the documents of the last pair
 };

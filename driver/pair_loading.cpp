@@ -13,7 +13,7 @@ namespace {
 
 // Touches nothing but its own document, so that loads can run at once.
 LoadedDocument LoadDocument(const std::string& path, bool keep_originals) {
-  LoadedDocument loaded{path, nullptr, {}, {}};
+  LoadedDocument loaded{path, nullptr, {}, xml::OriginalValues(MayNormalizeTypeNames)};
   if (xml::ReadDocumentFile(path, &loaded.document, &loaded.error)) {
     loaded.document->RewriteValues(PrepareValue, keep_originals ? &loaded.originals : nullptr);
   }

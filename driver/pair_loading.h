@@ -9,6 +9,7 @@
 #include <utility>
 #include <vector>
 
+#include "documents/type_name_normalization.h"
 #include "platform/xml/document.h"
 #include "platform/xml/read_error.h"
 
@@ -24,8 +25,9 @@ struct LoadedDocument {
   std::string path;
   std::unique_ptr<xml::Document> document;  // null when it could not be read
   xml::ReadError error;                     // why, when document is null
-  // The text of the values that preparation changed, when it was asked for.
-  xml::OriginalValues originals;
+  // When asked for, the text of the values whose type names preparation
+  // respelled; the others read as the document wrote them.
+  xml::OriginalValues originals{MayNormalizeTypeNames};
 };
 
 // The two documents of a pair.

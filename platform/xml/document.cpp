@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <cstring>
 #include <functional>
+#include <iterator>
 #include <new>
 #include <vector>
 
@@ -47,6 +48,11 @@ struct Document::RewritePass {
   };
   ValueRewrite rewrite;
   OriginalValues* originals;
+  // Whether the original of a changed value goes into `originals`.
+  bool Keeps(std::string_view original) const {
+    return originals != nullptr &&
+           (originals->worth_keeping_ == nullptr || originals->worth_keeping_(original));
+  }
   std::string scratch;
   std::string grown_text;
   std::vector<Grown> grown;
@@ -64,30 +70,56 @@ char* Document::AllocateSpare(size_t size) {
   return text_.data() + offset;
 }
 
-void OriginalValues::Add(const char* value, std::string_view original) {
-  entries_.push_back({value, text_.size(), original.size()});
-  text_ += original;
+void OriginalValues::Add(const char* value, std::string_view original, bool in_place) {
+  constexpr size_t kChunkSize = size_t{1} << 20;
+  if (original.size() + 1 > left_) {
+    left_ = std::max(kChunkSize, original.size() + 1);
+    chunks_.push_back(std::make_unique_for_overwrite<char[]>(left_));
+    next_ = chunks_.back().get();
+  }
+  std::memcpy(next_, original.data(), original.size());
+  next_[original.size()] = '\0';
+  (in_place ? in_place_ : moved_).push_back({value, next_});
+  next_ += original.size() + 1;
+  left_ -= original.size() + 1;
 }
 
 void OriginalValues::Seal() {
-  std::sort(entries_.begin(), entries_.end(),
-            [](const Entry& a, const Entry& b) { return std::less<>()(a.value, b.value); });
+  // Places are compared as addresses, which std::less orders totally.
+  auto before = [](const Entry& a, const Entry& b) {
+    return std::less<const char*>()(a.value, b.value);
+  };
+  if (!std::is_sorted(in_place_.begin(), in_place_.end(), before)) {
+    std::sort(in_place_.begin(), in_place_.end(), before);
+  }
+  if (!std::is_sorted(moved_.begin(), moved_.end(), before)) {
+    std::sort(moved_.begin(), moved_.end(), before);
+  }
+}
+
+void OriginalValues::Clear() {
+  in_place_.clear();
+  moved_.clear();
+  chunks_.clear();
+  next_ = nullptr;
+  left_ = 0;
 }
 
 std::optional<std::string_view> OriginalValues::Find(const char* value) const {
-  auto entry =
-      std::lower_bound(entries_.begin(), entries_.end(), value,
-                       [](const Entry& e, const char* v) { return std::less<>()(e.value, v); });
-  if (entry == entries_.end() || entry->value != value) return std::nullopt;
-  return std::string_view(text_).substr(entry->offset, entry->length);
+  for (const std::deque<Entry>* run : {&in_place_, &moved_}) {
+    auto entry = std::lower_bound(
+        run->begin(), run->end(), value,
+        [](const Entry& e, const char* v) { return std::less<const char*>()(e.value, v); });
+    if (entry != run->end() && entry->value == value) return std::string_view(entry->original);
+  }
+  return std::nullopt;
 }
 
 void Document::RewriteValues(ValueRewrite rewrite, OriginalValues* originals) {
   RewritePass pass{rewrite, originals, {}, {}, {}};
   if (originals != nullptr) {
     // The originals are the values as this pass found them.
-    originals->entries_.clear();
-    originals->text_.clear();
+    originals->Clear();
   }
   RewriteAll(pass);
   if (originals != nullptr) originals->Seal();
@@ -139,7 +171,7 @@ void Document::RewriteElement(Element& element, RewritePass& pass) {
     std::string_view text = UpToZero(pass.scratch);
     size_t room = value.size();
     if (text.size() <= room) {
-      if (pass.originals != nullptr) pass.originals->Add(value.data(), value);
+      if (pass.Keeps(value)) pass.originals->Add(value.data(), value, true);
       char* place = const_cast<char*>(value.data());  // the document's own buffer
       std::memcpy(place, text.data(), text.size());
       std::memset(place + text.size(), 0, room - text.size());
@@ -147,12 +179,13 @@ void Document::RewriteElement(Element& element, RewritePass& pass) {
     }
     // Moving overwrites the start of the slot, so the original is kept first
     // and given its new place after.
-    if (pass.originals != nullptr) pass.originals->Add(nullptr, value);
+    const bool keep = pass.Keeps(value);
+    if (keep) pass.originals->Add(nullptr, value, false);
     if (const char* moved = MoveValue(const_cast<char*>(slot), room, text)) {
-      if (pass.originals != nullptr) pass.originals->entries_.back().value = moved;
+      if (keep) pass.originals->moved_.back().value = moved;
       continue;
     }
-    if (pass.originals != nullptr) pass.originals->entries_.pop_back();
+    if (keep) pass.originals->moved_.pop_back();
     pass.grown.push_back({value.data(), pass.grown_text.size(), text.size()});
     pass.grown_text += text;
   }
@@ -210,7 +243,7 @@ void Document::RebuildBlock(Element& element, RewritePass& pass) {
     bool grew = next < pass.grown.size() && pass.grown[next].value == value;
     put(std::string_view(name, std::strlen(name) + 1));
     *out++ = '"';
-    if (grew && pass.originals != nullptr) pass.originals->Add(out, value);
+    if (grew && pass.Keeps(value)) pass.originals->Add(out, value, false);
     put(grew ? grown_value(pass.grown[next++]) : std::string_view(value));
     *out++ = '\0';
   }

@@ -1,6 +1,8 @@
 #pragma once
 
 #include <cstddef>
+#include <deque>
+#include <memory>
 #include <optional>
 #include <span>
 #include <string>
@@ -57,22 +59,36 @@ using ValueRewrite = bool (*)(std::string_view value, std::string* rewritten);
 // costs one allocation for all values rather than one per value.
 class OriginalValues {
  public:
-  // The text `value` had before the rewrite, if the rewrite changed it.
+  // Keeps the original of a changed value only when `worth_keeping` holds for
+  // it (of every changed value without it).
+  explicit OriginalValues(bool (*worth_keeping)(std::string_view original) = nullptr)
+      : worth_keeping_(worth_keeping) {}
+
+  // The text `value` had before the rewrite, if the rewrite changed it and it
+  // was worth keeping.
   // REQUIRES: the pass that filled it has ended.
   std::optional<std::string_view> Find(const char* value) const;
 
  private:
   friend class Document;
   struct Entry {
-    const char* value;
-    size_t offset;  // of the original text in text_
-    size_t length;
+    const char* value;     // where the rewritten value stands
+    const char* original;  // zero-terminated, in chunks_
   };
-  void Add(const char* value, std::string_view original);
+  // A pass visits values in document order, so each run comes in increasing
+  // order of place: values rewritten where they stood, and values given a new
+  // place (but for rebuilt blocks, which Seal sorts).
+  void Add(const char* value, std::string_view original, bool in_place);
   void Seal();
+  void Clear();
 
-  std::vector<Entry> entries_;
-  std::string text_;
+  bool (*worth_keeping_)(std::string_view original);
+  std::deque<Entry> in_place_;
+  std::deque<Entry> moved_;
+  // The original texts, in chunks that never move: no copying as they grow.
+  std::vector<std::unique_ptr<char[]>> chunks_;
+  char* next_ = nullptr;
+  size_t left_ = 0;
 };
 
 // A parsed XML document (read with ReadDocumentFile or ReadDocumentText): its
