@@ -1,12 +1,13 @@
 #include "describe/describe_run.h"
 
+#include <future>
 #include <string_view>
-#include <thread>
 #include <vector>
 
 #include "describe/header_describer.h"
 #include "describe/header_listing.h"
 #include "describe/interface_document.h"
+#include "platform/tools/background.h"
 
 namespace zor2::describe {
 namespace {
@@ -40,12 +41,13 @@ DescribeStatus RunDescribe(int argc, const char* const* argv, std::ostream& out,
                                  options.default_level, options.default_usage};
   // The groups are compiled side by side, one thread each.
   std::vector<GroupOutcome> outcomes(inputs.size());
-  std::vector<std::thread> helpers;
+  std::vector<std::future<void>> helpers;
   for (size_t g = 1; g < inputs.size(); ++g) {
-    helpers.emplace_back([&, g] { outcomes[g] = DescribeGroup(inputs[g], settings, kThreads); });
+    helpers.push_back(
+        RunInBackground([&, g] { outcomes[g] = DescribeGroup(inputs[g], settings, kThreads); }));
   }
   outcomes[0] = DescribeGroup(inputs[0], settings, kThreads);
-  for (std::thread& helper : helpers) helper.join();
+  for (std::future<void>& helper : helpers) helper.get();
 
   FrameworkDescription framework{options.framework, {}};
   for (GroupOutcome& outcome : outcomes) {

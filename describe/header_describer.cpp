@@ -5,14 +5,15 @@
 #include <algorithm>
 #include <array>
 #include <atomic>
+#include <future>
 #include <map>
 #include <memory>
 #include <set>
-#include <thread>
 #include <utility>
 
 #include "describe/comment_tags.h"
 #include "describe/token_text.h"
+#include "platform/tools/background.h"
 
 namespace zor2::describe {
 namespace {
@@ -653,10 +654,12 @@ GroupOutcome DescribeGroup(const GroupInput& input, const CompileSettings& setti
         units[h] = DescribeUnit(input.dir, {input.headers[h]}, settings);
       }
     };
-    std::vector<std::thread> helpers;
-    for (unsigned t = 1; t < threads && t < input.headers.size(); ++t) helpers.emplace_back(work);
+    std::vector<std::future<void>> helpers;
+    for (unsigned t = 1; t < threads && t < input.headers.size(); ++t) {
+      helpers.push_back(RunInBackground(work));
+    }
     work();
-    for (std::thread& helper : helpers) helper.join();
+    for (std::future<void>& helper : helpers) helper.get();
   }
 
   GroupOutcome outcome;
