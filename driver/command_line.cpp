@@ -6,6 +6,7 @@
 #include <string_view>
 #include <vector>
 
+#include "driver/output_clash.h"
 #include "platform/tools/argument_file.h"
 #include "platform/tools/log.h"
 #include "rules/attribute_values.h"
@@ -146,6 +147,14 @@ std::optional<ExitStatus> ReadCommandLine(int argc, const char* const* argv,
   if (!CollectItems(argc, argv, scan.program, &items)) return ExitStatus::kUsageError;
   if (std::optional<ExitStatus> help = ScanOptions(items, &scan, config)) return help;
   CheckMandatoryOptions(&scan);
+  // An output that names an input would destroy it: refused before anything
+  // is read or written.
+  if (!scan.failed) {
+    if (std::optional<std::string> clash = FindOutputClash(*config)) {
+      WriteLine(stderr, {scan.program, ": ", *clash});
+      scan.failed = true;
+    }
+  }
   if (scan.failed) {
     WriteLine(stderr, {kUsage});
     return ExitStatus::kUsageError;

@@ -114,16 +114,11 @@ class ComparisonRun {
   // Pairs each reference document with the checked document of the same name;
   // a reference document without one is passed over silently.
   void CompareDirectories() {
-    std::vector<std::string> entries;
+    std::vector<PairReader::Paths> pairs;
     std::string err;
-    if (!ListRegularFiles(config_.reference_path, &entries, &err)) {
+    if (!ListDocumentPairs(config_.reference_path, config_.checked_path, &pairs, &err)) {
       ReportFailure(config_.reference_path, "cannot list the directory");
       return;
-    }
-    std::vector<PairReader::Paths> pairs;
-    for (std::string& entry : entries) {
-      std::string checked = JoinPath(config_.checked_path, BaseName(entry));
-      if (IsRegularFile(checked)) pairs.push_back({std::move(entry), std::move(checked)});
     }
     PairReader reader(std::move(pairs));
     while (reader.HasNext()) ComparePair(reader.Next());

@@ -5,6 +5,7 @@
 
 #include "documents/type_name_normalization.h"
 #include "platform/tools/background.h"
+#include "platform/tools/paths.h"
 #include "platform/tools/xml_escaping.h"
 #include "platform/xml/reader.h"
 
@@ -40,6 +41,17 @@ bool PrepareValue(std::string_view value, std::string* rewritten) {
   std::string normalized;
   if (!NormalizeTypeNames(value, &normalized)) return DecodeXmlReferences(value, rewritten);
   if (!DecodeXmlReferences(normalized, rewritten)) *rewritten = std::move(normalized);
+  return true;
+}
+
+bool ListDocumentPairs(const std::string& reference_dir, const std::string& checked_dir,
+                       std::vector<PairReader::Paths>* pairs, std::string* err) {
+  std::vector<std::string> entries;
+  if (!ListRegularFiles(reference_dir, &entries, err)) return false;
+  for (std::string& entry : entries) {
+    std::string checked = JoinPath(checked_dir, BaseName(entry));
+    if (IsRegularFile(checked)) pairs->push_back({std::move(entry), std::move(checked)});
+  }
   return true;
 }
 
