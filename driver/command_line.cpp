@@ -71,7 +71,12 @@ bool TakeValue(const std::string& option, const std::string& value, OptionScan* 
     return true;
   }
   if (option == "-htm") {
-    config->help_page_path = value;
+    // An empty path, as an unset shell variable gives, asks for no page.
+    if (value.empty()) {
+      config->help_page_path.reset();
+    } else {
+      config->help_page_path = value;
+    }
     return true;
   }
   return false;

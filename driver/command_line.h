@@ -13,7 +13,7 @@ struct RunConfiguration {
   std::string reference_path;                 // "-r": a document or a directory of documents
   std::string checked_path;                   // "-c": likewise
   std::string output_path;                    // "-o": the report
-  std::optional<std::string> help_page_path;  // "-htm"
+  std::optional<std::string> help_page_path;  // "-htm", unless given ""
   CheckSettings settings;                     // "-L" and "-level"
 };
 
