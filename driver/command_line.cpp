@@ -9,6 +9,7 @@
 #include "driver/output_clash.h"
 #include "platform/tools/argument_file.h"
 #include "platform/tools/log.h"
+#include "platform/tools/printable_path.h"
 #include "rules/attribute_values.h"
 
 namespace zor2 {
@@ -44,7 +45,7 @@ bool CollectItems(int argc, const char* const* argv, std::string_view program,
                   std::vector<std::string>* items) {
   std::string err;
   if (argc == 3 && std::strcmp(argv[1], "=") == 0 && !ReadArgumentFile(argv[2], items, &err)) {
-    WriteLine(stderr, {program, ": unable to read file ", argv[2]});
+    WriteLine(stderr, {program, ": unable to read file ", PrintablePath(argv[2])});
     return false;
   }
   // An argument file without any item counts as no argument file.
@@ -125,9 +126,9 @@ void CheckMandatoryOptions(OptionScan* scan) {
 }
 
 void AnnounceRun(const RunConfiguration& config, Log& log) {
-  log.Progress() << "## Ref : " << config.reference_path;
-  log.Progress() << "## Checked : " << config.checked_path;
-  log.Progress() << "## Output : " << config.output_path;
+  log.Progress() << "## Ref : " << PrintablePath(config.reference_path);
+  log.Progress() << "## Checked : " << PrintablePath(config.checked_path);
+  log.Progress() << "## Output : " << PrintablePath(config.output_path);
 }
 
 void FixLevel(const std::optional<std::string>& level_text, CheckSettings* settings, Log& log) {

@@ -31,6 +31,7 @@
 #include "platform/tools/file_output.h"
 #include "platform/tools/log.h"
 #include "platform/tools/paths.h"
+#include "platform/tools/printable_path.h"
 #include "platform/xml/output_element.h"
 #include "rules/framework_comparison.h"
 
@@ -63,7 +64,7 @@ class ComparisonRun {
   // Names `path` and why it failed in an "ERROR: " line; the run's result is
   // then incomplete. Every failure of a run is reported here.
   void ReportFailure(const std::string& path, const std::string& reason) {
-    log_.Warning() << "ERROR: " << path << ": " << reason;
+    log_.Warning() << "ERROR: " << PrintablePath(path) << ": " << reason;
     incomplete_ = true;
   }
 
@@ -105,9 +106,11 @@ class ComparisonRun {
     const bool checked_known = CheckInputKind(checked);
     if (!reference_known || !checked_known) return;
     if (IsDirectory(checked)) {
-      ReportFailure(checked, "Is a directory, but the reference " + reference + " is a file");
+      ReportFailure(checked,
+                    "Is a directory, but the reference " + PrintablePath(reference) + " is a file");
     } else {
-      ReportFailure(checked, "Not a directory, but the reference " + reference + " is a directory");
+      ReportFailure(checked, "Not a directory, but the reference " + PrintablePath(reference) +
+                                 " is a directory");
     }
   }
 
@@ -174,7 +177,7 @@ class ComparisonRun {
     if (opened) {
       ReportFailure(path, err);
     } else {
-      log_.Warning() << "Unable to open file " << path;
+      log_.Warning() << "Unable to open file " << PrintablePath(path);
       incomplete_ = true;
     }
   }

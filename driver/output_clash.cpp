@@ -7,6 +7,7 @@
 
 #include "driver/pair_loading.h"
 #include "platform/tools/paths.h"
+#include "platform/tools/printable_path.h"
 
 namespace zor2 {
 namespace {
@@ -41,7 +42,7 @@ bool SameFile(const RunFile& a, const RunFile& b) {
 }
 
 std::string Describe(const RunFile& file) {
-  return std::string(file.role) + " " + file.path + " (" + file.option + ")";
+  return std::string(file.role) + " " + PrintablePath(file.path) + " (" + file.option + ")";
 }
 
 }  // namespace
