@@ -120,7 +120,7 @@ class ComparisonRun {
     std::vector<PairReader::Paths> pairs;
     std::string err;
     if (!ListDocumentPairs(config_.reference_path, config_.checked_path, &pairs, &err)) {
-      ReportFailure(config_.reference_path, "cannot list the directory");
+      ReportFailure(config_.reference_path, err);
       return;
     }
     PairReader reader(std::move(pairs));
@@ -174,12 +174,9 @@ class ComparisonRun {
     bool opened = false;
     std::string err;
     if (WriteFileInPlace(path, HelpPageText(), &opened, &err)) return;
-    if (opened) {
-      ReportFailure(path, err);
-    } else {
-      log_.Warning() << "Unable to open file " << PrintablePath(path);
-      incomplete_ = true;
-    }
+    // The page's long-standing line comes first when it cannot even be opened.
+    if (!opened) log_.Warning() << "Unable to open file " << PrintablePath(path);
+    ReportFailure(path, err);
   }
 
   const RunConfiguration& config_;
