@@ -86,8 +86,9 @@ constexpr size_t kPairwiseLimit = 16;
 
 // One pass over a document's text. The parser writes into the text only
 // inside start tags (see document_storage.h), and never moves a byte other than
-// the tag's, so a position keeps its line and column; the only line feeds it
-// overwrites (after an attribute name) are remembered in hidden_newlines_.
+// the tag's, so a position keeps its line and column; the only line ends it
+// overwrites (after an attribute name) are remembered in hidden_line_ends_ and
+// put back before a fault is located.
 class Parser {
  public:
   // Parses `text` into a new document.
@@ -109,7 +110,8 @@ class Parser {
   bool Run(ReadError* err) {
     if (ParseDocument()) return true;
     err->reason = std::move(reason_);
-    LocateInText(begin_, fault_, hidden_newlines_, &err->line, &err->column);
+    for (const HiddenLineEnd& hidden : hidden_line_ends_) begin_[hidden.offset] = hidden.byte;
+    LocateInText(begin_, fault_, &err->line, &err->column);
     return false;
   }
 
@@ -151,7 +153,11 @@ class Parser {
   std::vector<std::string_view> attribute_names_;
   std::unordered_set<std::string_view> attribute_set_;
   bool attribute_set_used_ = false;
-  std::vector<size_t> hidden_newlines_;
+  struct HiddenLineEnd {
+    size_t offset;
+    char byte;
+  };
+  std::vector<HiddenLineEnd> hidden_line_ends_;
   const char* fault_ = nullptr;
   std::string reason_;
 };
@@ -264,7 +270,9 @@ bool Parser::ParseAttribute() {
   if (!RememberAttributeName(name_text)) {
     return Fail(name, "duplicate attribute \"" + std::string(name_text) + "\"");
   }
-  if (*name_end == '\n') hidden_newlines_.push_back(name_end - begin_);
+  if (*name_end == '\n' || *name_end == '\r') {
+    hidden_line_ends_.push_back({static_cast<size_t>(name_end - begin_), *name_end});
+  }
   *name_end = '\0';
   *close = '\0';
   p_ = close + 1;

@@ -81,7 +81,7 @@ std::optional<Declaration> DeclaredEncoding(std::string_view text) {
 
 bool Refuse(ReadError* err, std::string reason, std::string_view text, size_t offset) {
   err->reason = std::move(reason);
-  LocateInText(text.data(), text.data() + offset, {}, &err->line, &err->column);
+  LocateInText(text.data(), text.data() + offset, &err->line, &err->column);
   return false;
 }
 
@@ -138,7 +138,7 @@ bool ConversionFailed(ReadError* err, const std::string& encoding, const Output&
   } else {
     err->reason = std::strerror(errno);
   }
-  LocateInText(output.begin(), output.end(), {}, &err->line, &err->column);
+  LocateInText(output.begin(), output.end(), &err->line, &err->column);
   return false;
 }
 
@@ -204,18 +204,14 @@ bool ConvertToUtf8(TextBuffer* text, size_t* start, ReadError* err) {
   return Transcode(name, 1, text, 0, declared->offset, err);
 }
 
-void LocateInText(const char* begin, const char* position,
-                  const std::vector<size_t>& hidden_newlines, int* line, int* column) {
-  size_t offset = position - begin;
-  size_t lines = std::count(begin, position, '\n');
+void LocateInText(const char* begin, const char* position, int* line, int* column) {
+  size_t lines = 0;
   const char* line_start = begin;
-  if (const void* newline = memrchr(begin, '\n', offset)) {
-    line_start = static_cast<const char*>(newline) + 1;
-  }
-  auto hidden_end = std::lower_bound(hidden_newlines.begin(), hidden_newlines.end(), offset);
-  lines += hidden_end - hidden_newlines.begin();
-  if (hidden_end != hidden_newlines.begin()) {
-    line_start = std::max(line_start, begin + *(hidden_end - 1) + 1);
+  for (const char* p = begin; p < position; ++p) {
+    if (*p != '\n' && *p != '\r') continue;
+    if (*p == '\r' && p + 1 < position && p[1] == '\n') ++p;
+    ++lines;
+    line_start = p + 1;
   }
   // A character is counted at its first byte: UTF-8 continuation bytes are
   // 10xxxxxx.

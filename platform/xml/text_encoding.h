@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cstddef>
-#include <vector>
 
 #include "platform/xml/document_storage.h"
 #include "platform/xml/read_error.h"
@@ -20,9 +19,8 @@ namespace zor2::xml {
 bool ConvertToUtf8(TextBuffer* text, size_t* start, ReadError* err);
 
 // Sets the 1-based line and column, counted in characters, of `position` in
-// the UTF-8 text that starts at `begin`. `hidden_newlines` holds, in increasing
-// order, the offsets of line feeds that were overwritten in the text.
-void LocateInText(const char* begin, const char* position,
-                  const std::vector<size_t>& hidden_newlines, int* line, int* column);
+// the UTF-8 text that starts at `begin`. A lone carriage return, a carriage
+// return and line feed, and a lone line feed each end one line.
+void LocateInText(const char* begin, const char* position, int* line, int* column);
 
 }  // namespace zor2::xml
