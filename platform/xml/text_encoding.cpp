@@ -1,6 +1,8 @@
 #include "platform/xml/text_encoding.h"
 
 #include <iconv.h>
+#include <sys/eventfd.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <cerrno>
@@ -130,6 +132,34 @@ class Output {
   size_t left_;
 };
 
+// Why no conversion at all can be set up, or nothing when conversions work.
+// glibc's iconv_open answers EINVAL both for a name it does not know and when
+// it cannot load its conversion tables, as with no file descriptor left
+// (after which it keeps failing for the whole process): a descriptor taken
+// and given back, and a conversion that always exists, tell these apart.
+std::optional<std::string> ConversionsUnavailable() {
+  const int probe = ::eventfd(0, EFD_CLOEXEC);
+  if (probe < 0) return std::strerror(errno);
+  ::close(probe);
+  IconvHandle known(iconv_open("UTF-8", "UTF-16LE"));
+  if (!known.valid()) return "the system's conversion tables cannot be loaded";
+  return std::nullopt;
+}
+
+// A converter from `encoding` could not be set up; iconv_open's errno tells
+// why.
+bool SetupFailed(const std::string& encoding, std::string_view bytes, size_t name_offset,
+                 ReadError* err) {
+  const int reason = errno;
+  std::optional<std::string> unavailable =
+      reason == EINVAL ? ConversionsUnavailable() : std::strerror(reason);
+  if (!unavailable) return Refuse(err, "unknown encoding \"" + encoding + "\"", bytes, name_offset);
+  // The system's failure, not the document's: no position.
+  err->reason = "cannot convert from encoding \"" + encoding + "\": " + *unavailable;
+  err->line = err->column = 0;
+  return false;
+}
+
 bool ConversionFailed(ReadError* err, const std::string& encoding, const Output& output) {
   if (errno == EILSEQ) {
     err->reason = "byte sequence not valid in encoding \"" + encoding + "\"";
@@ -148,9 +178,7 @@ bool Transcode(const std::string& encoding, size_t unit, TextBuffer* text, size_
                size_t name_offset, ReadError* err) {
   std::string_view bytes(text->data(), text->size);
   IconvHandle converter(iconv_open("UTF-8", encoding.c_str()));
-  if (!converter.valid()) {
-    return Refuse(err, "unknown encoding \"" + encoding + "\"", bytes, name_offset);
-  }
+  if (!converter.valid()) return SetupFailed(encoding, bytes, name_offset, err);
   char* in = text->data() + skip;
   size_t in_left = text->size - skip;
   Output output(in_left / unit + in_left / (8 * unit) + 64);

@@ -15,7 +15,8 @@ namespace zor2::xml {
 // byte-order mark, and documents whose XML declaration names an encoding other
 // than UTF-8 (or ASCII), are converted into a new buffer that replaces `*text`.
 // Returns false with `err` filled when iconv does not know the declared
-// encoding or the bytes are not valid in it.
+// encoding, the system cannot set up the conversion (no position then), or the
+// bytes are not valid in it.
 bool ConvertToUtf8(TextBuffer* text, size_t* start, ReadError* err);
 
 // Sets the 1-based line and column, counted in characters, of `position` in
