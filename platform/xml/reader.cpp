@@ -14,22 +14,29 @@
 
 #include "platform/tools/file_descriptor.h"
 #include "platform/xml/text_encoding.h"
+#include "platform/xml/xml_characters.h"
 
 namespace zor2::xml {
 namespace {
 
-enum CharacterClass : unsigned char { kSpace = 1, kNameStart = 2, kNameChar = 4 };
+enum CharacterClass : unsigned char {
+  kSpace = 1,
+  kNameStart = 2,
+  kNameChar = 4,
+  kAsciiNameChar = 8,
+};
 
 // XML names, with "@" allowed anywhere; every byte of a multi-byte UTF-8
-// character counts as a name character.
+// character counts as a name character, but for kAsciiNameChar.
 constexpr std::array<unsigned char, 256> kClasses = [] {
   std::array<unsigned char, 256> classes{};
   for (int c = 0; c < 256; ++c) {
-    bool start = (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == '_' || c == ':' ||
-                 c == '@' || c >= 0x80;
-    bool name = start || (c >= '0' && c <= '9') || c == '-' || c == '.';
+    bool ascii_start =
+        (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == '_' || c == ':' || c == '@';
+    bool ascii_name = ascii_start || (c >= '0' && c <= '9') || c == '-' || c == '.';
     bool space = c == ' ' || c == '\t' || c == '\n' || c == '\r';
-    classes[c] = (space ? kSpace : 0) | (start ? kNameStart : 0) | (name ? kNameChar : 0);
+    classes[c] = (space ? kSpace : 0) | (ascii_start || c >= 0x80 ? kNameStart : 0) |
+                 (ascii_name || c >= 0x80 ? kNameChar : 0) | (ascii_name ? kAsciiNameChar : 0);
   }
   return classes;
 }();
@@ -49,12 +56,15 @@ inline char* SkipName(char* p) {
 }
 
 // Where the scan of an attribute value stops: at its closing quote, at "<"
-// (not allowed in a value) and at a zero byte (the end sentinel, or a zero in
-// the text).
+// (not allowed in a value), at a zero byte (the end sentinel, or a zero in the
+// text), and at what must be examined before the value may reach a report: a
+// reference, a control character and the first byte of a non-ASCII character.
 template <char kQuote>
 constexpr std::array<bool, 256> kValueStops = [] {
   std::array<bool, 256> stops{};
-  stops[static_cast<unsigned char>(kQuote)] = stops['<'] = stops[0] = true;
+  stops[static_cast<unsigned char>(kQuote)] = stops['<'] = stops['&'] = true;
+  for (int c = 0; c < 0x20; ++c) stops[c] = c != '\t' && c != '\n' && c != '\r';
+  for (int c = 0x80; c < 0x100; ++c) stops[c] = true;
   return stops;
 }();
 
@@ -76,6 +86,13 @@ bool HasPrefix(const char* p, const char* end, std::string_view prefix) {
 
 char* Find(char* from, char* end, std::string_view text) {
   return static_cast<char*>(memmem(from, end - from, text.data(), text.size()));
+}
+
+int DigitValue(char c, int base) {
+  if (c >= '0' && c <= '9') return c - '0';
+  if (base == 16 && c >= 'a' && c <= 'f') return c - 'a' + 10;
+  if (base == 16 && c >= 'A' && c <= 'F') return c - 'A' + 10;
+  return -1;
 }
 
 // Up to this many attributes, an element's names are compared pairwise; past
@@ -119,6 +136,12 @@ class Parser {
   bool ParseMarkup(char* lt);
   bool ParseStartTag(char* lt);
   bool ParseAttribute();
+  template <char kQuote>
+  char* ScanCheckedValue(char* value);
+  bool CheckValueStop(char*& p);
+  bool CheckReference(const char* amp);
+  char* ScanName(char* p);
+  bool SkipNonAscii(char*& p);
   bool RememberAttributeName(std::string_view name);
   bool ParseEndTag(char* lt);
   bool ParseDeclaration(char* lt);
@@ -204,7 +227,8 @@ bool Parser::ParseStartTag(char* lt) {
   if (root_closed_) return Fail(lt, "more than one root element");
   char* name = lt + 1;
   if (!Is(*name, kNameStart)) return Expected(name, "an element name after '<'");
-  char* name_end = SkipName(name + 1);
+  char* name_end = ScanName(name);
+  if (name_end == nullptr) return false;
   // The tag moves one byte left, over the "<", so that its zero terminator
   // does not overwrite the character after it.
   size_t length = name_end - name;
@@ -254,7 +278,8 @@ bool Parser::ParseStartTag(char* lt) {
 
 bool Parser::ParseAttribute() {
   char* name = p_;
-  char* name_end = SkipName(name + 1);
+  char* name_end = ScanName(name);
+  if (name_end == nullptr) return false;
   std::string_view name_text(name, name_end - name);
   char* p = SkipSpace(name_end);
   if (*p != '=') return Expected(p, "'=' after attribute name \"" + std::string(name_text) + "\"");
@@ -262,11 +287,8 @@ bool Parser::ParseAttribute() {
   char quote = *p;
   if (quote != '"' && quote != '\'') return Expected(p, "a quoted attribute value");
   char* value = p + 1;
-  char* close = quote == '"' ? ScanValue<'"'>(value) : ScanValue<'\''>(value);
-  if (*close != quote) {
-    if (*close == '<') return Fail(close, "'<' is not allowed in an attribute value");
-    return Expected(close, "the closing quote of the attribute value");
-  }
+  char* close = quote == '"' ? ScanCheckedValue<'"'>(value) : ScanCheckedValue<'\''>(value);
+  if (close == nullptr) return false;
   if (!RememberAttributeName(name_text)) {
     return Fail(name, "duplicate attribute \"" + std::string(name_text) + "\"");
   }
@@ -276,6 +298,77 @@ bool Parser::ParseAttribute() {
   *name_end = '\0';
   *close = '\0';
   p_ = close + 1;
+  return true;
+}
+
+// Returns the closing quote of the value that starts at `value`, or null
+// with the fault set.
+template <char kQuote>
+char* Parser::ScanCheckedValue(char* value) {
+  char* p = ScanValue<kQuote>(value);
+  while (*p != kQuote) {
+    if (!CheckValueStop(p)) return nullptr;
+    p = ScanValue<kQuote>(p);
+  }
+  return p;
+}
+
+// At a stop of the value scan other than the closing quote: fails, or moves
+// `p` past what it examined.
+bool Parser::CheckValueStop(char*& p) {
+  const unsigned char c = static_cast<unsigned char>(*p);
+  if (c == '<') return Fail(p, "'<' is not allowed in an attribute value");
+  if (c == 0) return Expected(p, "the closing quote of the attribute value");
+  if (c == '&') return CheckReference(p++);
+  if (c < 0x20) return Fail(p, "character " + CodePointName(c) + " is not allowed in XML");
+  return SkipNonAscii(p);
+}
+
+// A character reference to a character that XML does not allow is a fault;
+// anything else after "&" is left to the decoding of values, as written.
+bool Parser::CheckReference(const char* amp) {
+  if (amp[1] != '#') return true;
+  const char* p = amp + 2;
+  int base = 10;
+  if (*p == 'x') {
+    base = 16;
+    ++p;
+  }
+  const char* digits = p;
+  char32_t code_point = 0;
+  bool too_large = false;
+  for (int digit; (digit = DigitValue(*p, base)) >= 0; ++p) {
+    // Past the Unicode range the value is only marked, so it cannot overflow.
+    if (!too_large) code_point = code_point * base + digit;
+    if (code_point > 0x10FFFF) too_large = true;
+  }
+  if (p == digits || *p != ';') return true;
+  if (too_large) return Fail(amp, "character reference beyond U+10FFFF is not allowed in XML");
+  if (IsXmlCharacter(code_point)) return true;
+  return Fail(amp,
+              "character reference to " + CodePointName(code_point) + " is not allowed in XML");
+}
+
+// Returns the end of the name that starts at `p` (whose first character was
+// checked), or null with the fault set when a non-ASCII character of it is
+// not well-formed UTF-8 or not allowed in XML.
+char* Parser::ScanName(char* p) {
+  for (;;) {
+    while (Is(*p, kAsciiNameChar)) ++p;
+    if (static_cast<unsigned char>(*p) < 0x80) return p;
+    if (!SkipNonAscii(p)) return nullptr;
+  }
+}
+
+// Moves `p` past the non-ASCII character there, or fails.
+bool Parser::SkipNonAscii(char*& p) {
+  char32_t code_point;
+  const size_t length = DecodeUtf8(p, &code_point);
+  if (length == 0) return Fail(p, "invalid UTF-8 byte sequence");
+  if (!IsXmlCharacter(code_point)) {
+    return Fail(p, "character " + CodePointName(code_point) + " is not allowed in XML");
+  }
+  p += length;
   return true;
 }
 
