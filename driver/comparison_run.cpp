@@ -18,6 +18,7 @@
 #include <sys/stat.h>
 
 #include <cerrno>
+#include <csignal>
 #include <cstring>
 #include <future>
 #include <memory>
@@ -193,6 +194,9 @@ ExitStatus RunComparison(const RunConfiguration& config) {
 }
 
 ExitStatus RunProgram(int argc, const char* const* argv) {
+  // A log stream whose reader has gone (a closed pipe) fails its writes
+  // instead of ending the process: the report is still written.
+  std::signal(SIGPIPE, SIG_IGN);
   RunConfiguration config;
   std::optional<ExitStatus> ended = ReadCommandLine(argc, argv, &config);
   return ended ? *ended : RunComparison(config);
