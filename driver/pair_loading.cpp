@@ -1,6 +1,7 @@
 #include "driver/pair_loading.h"
 
 #include <filesystem>
+#include <new>
 #include <system_error>
 
 #include "documents/type_name_normalization.h"
@@ -12,11 +13,17 @@
 namespace zor2 {
 namespace {
 
-// Touches nothing but its own document, so that loads can run at once.
+// Touches nothing but its own document, so that loads can run at once. A
+// document that does not fit in memory is a fault of its pair only.
 LoadedDocument LoadDocument(const std::string& path) {
   LoadedDocument loaded{path, nullptr, {}};
-  if (xml::ReadDocumentFile(path, &loaded.document, &loaded.error)) {
-    loaded.document->RewriteValues(PrepareValue);
+  try {
+    if (xml::ReadDocumentFile(path, &loaded.document, &loaded.error)) {
+      loaded.document->RewriteValues(PrepareValue);
+    }
+  } catch (const std::bad_alloc&) {
+    loaded.document.reset();
+    loaded.error = xml::ReadError{xml::kNotEnoughMemory, 0, 0};
   }
   return loaded;
 }

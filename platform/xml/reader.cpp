@@ -2,12 +2,17 @@
 
 #include <fcntl.h>
 #include <strings.h>
+#include <sys/resource.h>
 #include <sys/stat.h>
+#include <sys/sysinfo.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
+#include <cstdint>
 #include <cstring>
+#include <limits>
 #include <string>
 #include <unordered_set>
 #include <vector>
@@ -504,6 +509,23 @@ bool Refuse(ReadError* err, int error_number) {
   return false;
 }
 
+// The most memory the process could ever hold: the machine's memory and swap,
+// or less when the process is limited.
+uintmax_t MemoryLimit() {
+  uintmax_t limit = std::numeric_limits<uintmax_t>::max();
+  struct sysinfo machine;
+  if (::sysinfo(&machine) == 0) {
+    limit = (uintmax_t{machine.totalram} + machine.totalswap) * machine.mem_unit;
+  }
+  for (int resource : {RLIMIT_AS, RLIMIT_DATA}) {
+    struct rlimit process;
+    if (::getrlimit(resource, &process) == 0 && process.rlim_cur != RLIM_INFINITY) {
+      limit = std::min<uintmax_t>(limit, process.rlim_cur);
+    }
+  }
+  return limit;
+}
+
 // Reads the file at `path` in one piece into `text`, with spare capacity
 // after it for values that preparation makes longer.
 bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
@@ -512,6 +534,11 @@ bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
   struct stat status;
   if (::fstat(file.get(), &status) != 0) return Refuse(err, errno);
   if (S_ISDIR(status.st_mode)) return Refuse(err, EISDIR);
+  // A document that could never be held is refused before any of it is read.
+  if (S_ISREG(status.st_mode) && static_cast<uintmax_t>(status.st_size) >= MemoryLimit()) {
+    err->reason = kNotEnoughMemory;
+    return false;
+  }
   // One byte more than a regular file's size, so that its end is seen
   // without growing the buffer.
   size_t limit = S_ISREG(status.st_mode) ? static_cast<size_t>(status.st_size) + 1 : 65536;
