@@ -526,22 +526,28 @@ uintmax_t MemoryLimit() {
   return limit;
 }
 
-// Reads the file at `path` in one piece into `text`, with spare capacity
-// after it for values that preparation makes longer.
+// Reads the regular file at `path` in one piece into `text`, with spare
+// capacity after it for values that preparation makes longer. It is opened
+// without blocking, since a named pipe (or a device) may stand where a regular
+// file was seen a moment before; only a regular file is read.
 bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
-  FileDescriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC));
+  FileDescriptor file(::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
   if (!file.valid()) return Refuse(err, errno);
   struct stat status;
   if (::fstat(file.get(), &status) != 0) return Refuse(err, errno);
   if (S_ISDIR(status.st_mode)) return Refuse(err, EISDIR);
+  if (!S_ISREG(status.st_mode)) {
+    err->reason = "Not a regular file";
+    return false;
+  }
   // A document that could never be held is refused before any of it is read.
-  if (S_ISREG(status.st_mode) && static_cast<uintmax_t>(status.st_size) >= MemoryLimit()) {
+  if (static_cast<uintmax_t>(status.st_size) >= MemoryLimit()) {
     err->reason = kNotEnoughMemory;
     return false;
   }
-  // One byte more than a regular file's size, so that its end is seen
-  // without growing the buffer.
-  size_t limit = S_ISREG(status.st_mode) ? static_cast<size_t>(status.st_size) + 1 : 65536;
+  // One byte more than the file's size, so that its end is seen without
+  // growing the buffer (it grows should the file grow meanwhile).
+  size_t limit = static_cast<size_t>(status.st_size) + 1;
   TextBuffer buffer = TextBuffer::Allocate(limit, limit / 4);
   size_t length = 0;
   for (;;) {
