@@ -30,15 +30,19 @@ bool WriteAll(int fd, std::string_view bytes) {
   return true;
 }
 
-// Creates a new file named `path` followed by a random suffix, with `mode`
-// (less the umask); sets `temporary` to its name.
+// Creates a new file in the directory of `path`, with `mode` (less the
+// umask); sets `temporary` to its name. The name is short and hidden,
+// ".zor2check." and six random letters, so that it fits wherever `path`'s
+// name fits and stays out of listings.
 FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string* temporary) {
   static constexpr char kLetters[] =
       "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789";
+  const size_t slash = path.rfind('/');
+  const std::string directory = slash == std::string::npos ? "" : path.substr(0, slash + 1);
   std::random_device seed;
   std::minstd_rand random(seed());
   for (int attempt = 0; attempt < 100; ++attempt) {
-    *temporary = path + ".tmp";
+    *temporary = directory + ".zor2check.";
     for (int i = 0; i < 6; ++i) *temporary += kLetters[random() % (sizeof kLetters - 1)];
     FileDescriptor file(
         ::open(temporary->c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOCTTY | O_CLOEXEC, mode));

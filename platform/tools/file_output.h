@@ -7,7 +7,8 @@ namespace zor2 {
 
 // Writes `bytes` to the file at `path` so that the file is never left
 // half-written: a regular file, or a path that does not exist yet, is written
-// to a new temporary file in the same directory, which is then renamed over it
+// to a new temporary file in the same directory (".zor2check." and six random
+// letters, whatever the length of the file's name), which is then renamed over it
 // (a replaced file keeps its permission bits; a new one gets 0644 less the
 // umask). A path that exists and is not a regular file (a symbolic link, a
 // device, a pipe) is opened and written directly. False with the system's
