@@ -172,9 +172,11 @@ class ComparisonRun {
   void WriteHelpPage() {
     if (!config_.help_page_path) return;
     const std::string& path = *config_.help_page_path;
+    // Written as the report is, so that a failed write leaves any earlier page
+    // whole.
     bool opened = false;
     std::string err;
-    if (WriteFileInPlace(path, HelpPageText(), &opened, &err)) return;
+    if (WriteFileAtomically(path, HelpPageText(), &opened, &err)) return;
     // The page's long-standing line comes first when it cannot even be opened.
     if (!opened) log_.Warning() << "Unable to open file " << PrintablePath(path);
     ReportFailure(path, err);
@@ -197,6 +199,7 @@ ExitStatus RunProgram(int argc, const char* const* argv) {
   // A log stream whose reader has gone (a closed pipe) fails its writes
   // instead of ending the process: the report is still written.
   std::signal(SIGPIPE, SIG_IGN);
+  RemoveTemporaryFilesOnInterrupt();
   RunConfiguration config;
   std::optional<ExitStatus> ended = ReadCommandLine(argc, argv, &config);
   return ended ? *ended : RunComparison(config);

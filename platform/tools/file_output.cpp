@@ -4,7 +4,9 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <atomic>
 #include <cerrno>
+#include <csignal>
 #include <cstring>
 #include <random>
 
@@ -12,6 +14,18 @@
 
 namespace zor2 {
 namespace {
+
+// The temporary file being written, for the signal handler: outputs are
+// written one at a time.
+std::atomic<const char*> temporary_in_progress{nullptr};
+static_assert(std::atomic<const char*>::is_always_lock_free, "read by a signal handler");
+
+extern "C" void EndInterruptedRun(int signal_number) {
+  if (const char* temporary = temporary_in_progress.load()) ::unlink(temporary);
+  // The handler was reset on entry: ending by the signal itself tells the
+  // parent how the run ended (a shell shows 128 and its number).
+  ::raise(signal_number);
+}
 
 bool Fail(std::string* err, int error_number) {
   *err = std::strerror(error_number);
@@ -42,11 +56,17 @@ FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string
   std::random_device seed;
   std::minstd_rand random(seed());
   for (int attempt = 0; attempt < 100; ++attempt) {
-    *temporary = directory + ".zor2check.";
-    for (int i = 0; i < 6; ++i) *temporary += kLetters[random() % (sizeof kLetters - 1)];
+    std::string name = directory + ".zor2check.";
+    for (int i = 0; i < 6; ++i) name += kLetters[random() % (sizeof kLetters - 1)];
+    // Published before it exists, so that no signal can leave it behind.
+    temporary_in_progress.store(nullptr);
+    *temporary = std::move(name);
+    temporary_in_progress.store(temporary->c_str());
     FileDescriptor file(
         ::open(temporary->c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOCTTY | O_CLOEXEC, mode));
-    if (file.valid() || errno != EEXIST) return file;
+    if (file.valid()) return file;
+    temporary_in_progress.store(nullptr);
+    if (errno != EEXIST) return file;
   }
   errno = EEXIST;
   return FileDescriptor(-1);
@@ -54,14 +74,17 @@ FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string
 
 }  // namespace
 
-bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::string* err) {
+bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,
+                         std::string* err) {
+  bool opened_here = false;
+  if (opened == nullptr) opened = &opened_here;
   struct stat status;
   const bool exists = ::lstat(path.c_str(), &status) == 0;
-  bool opened;
-  if (exists && !S_ISREG(status.st_mode)) return WriteFileInPlace(path, bytes, &opened, err);
+  if (exists && !S_ISREG(status.st_mode)) return WriteFileInPlace(path, bytes, opened, err);
 
   std::string temporary;
   FileDescriptor file = CreateTemporary(path, 0644, &temporary);
+  *opened = file.valid();
   if (!file.valid()) return Fail(err, errno);
   // A replaced file keeps its mode; the mode is a courtesy, so a file system
   // that refuses it does not fail the write.
@@ -70,9 +93,30 @@ bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::s
   if (!WriteAll(file.get(), bytes)) error = errno;
   if (!file.Close() && error == 0) error = errno;
   if (error == 0 && ::rename(temporary.c_str(), path.c_str()) != 0) error = errno;
-  if (error == 0) return true;
-  ::unlink(temporary.c_str());
-  return Fail(err, error);
+  if (error != 0) ::unlink(temporary.c_str());
+  temporary_in_progress.store(nullptr);
+  return error == 0 || Fail(err, error);
+}
+
+void RemoveTemporaryFilesOnInterrupt() {
+  struct sigaction action = {};
+  action.sa_handler = EndInterruptedRun;
+  action.sa_flags = SA_RESETHAND;
+  sigemptyset(&action.sa_mask);
+  sigaddset(&action.sa_mask, SIGINT);
+  sigaddset(&action.sa_mask, SIGTERM);
+  for (int signal_number : {SIGINT, SIGTERM}) {
+    // A run started with the signal ignored (a background job, nohup) keeps
+    // ignoring it.
+    struct sigaction current;
+    if (::sigaction(signal_number, nullptr, &current) == 0 && current.sa_handler == SIG_IGN) {
+      continue;
+    }
+    ::sigaction(signal_number, &action, nullptr);
+  }
+  // A write past the file size limit then fails with EFBIG, like any other
+  // failed write, instead of ending the run.
+  std::signal(SIGXFSZ, SIG_IGN);
 }
 
 bool WriteFileInPlace(const std::string& path, std::string_view bytes, bool* opened,

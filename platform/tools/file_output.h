@@ -13,7 +13,16 @@ namespace zor2 {
 // umask). A path that exists and is not a regular file (a symbolic link, a
 // device, a pipe) is opened and written directly. False with the system's
 // reason in `err` when any step fails; the temporary file is then removed.
-bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::string* err);
+// `opened`, when given, tells whether the file (or the temporary one) could be
+// opened at all. Outputs are written one at a time.
+bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,
+                         std::string* err);
+
+// Makes SIGINT and SIGTERM (unless ignored from the start) remove the
+// temporary file being written before the process ends by the signal, and
+// makes a write past the file size limit fail with EFBIG rather than end the
+// process (SIGXFSZ ignored). Call once, before any output is written.
+void RemoveTemporaryFilesOnInterrupt();
 
 // Writes `bytes` to the file at `path`, created or truncated, in place. False
 // with the system's reason in `err` when it cannot; `*opened` then tells
