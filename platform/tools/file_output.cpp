@@ -44,6 +44,38 @@ bool WriteAll(int fd, std::string_view bytes) {
   return true;
 }
 
+// The directory part of `path`, with its final "/", or "" for a bare name.
+std::string DirectoryOf(const std::string& path) {
+  const size_t slash = path.rfind('/');
+  return slash == std::string::npos ? "" : path.substr(0, slash + 1);
+}
+
+// Sets `target` to the file that `path` finally names, its symbolic links
+// followed (the last one may dangle), or to `path` when it is no link. False
+// with errno set when a link cannot be read or the links loop.
+bool FinalTarget(const std::string& path, std::string* target) {
+  *target = path;
+  // The kernel's own limit on the links of one path.
+  for (int links = 0; links < 40; ++links) {
+    struct stat status;
+    if (::lstat(target->c_str(), &status) != 0 || !S_ISLNK(status.st_mode)) return true;
+    std::string text(256, '\0');
+    for (;;) {
+      const ssize_t length = ::readlink(target->c_str(), text.data(), text.size());
+      if (length < 0) return false;
+      if (static_cast<size_t>(length) < text.size()) {
+        text.resize(static_cast<size_t>(length));
+        break;
+      }
+      text.resize(text.size() * 2);
+    }
+    // A relative link is read from the directory that holds it.
+    *target = !text.empty() && text[0] == '/' ? text : DirectoryOf(*target) + text;
+  }
+  errno = ELOOP;
+  return false;
+}
+
 // Creates a new file in the directory of `path`, with `mode` (less the
 // umask); sets `temporary` to its name. The name is short and hidden,
 // ".zor2check." and six random letters, so that it fits wherever `path`'s
@@ -51,8 +83,7 @@ bool WriteAll(int fd, std::string_view bytes) {
 FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string* temporary) {
   static constexpr char kLetters[] =
       "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789";
-  const size_t slash = path.rfind('/');
-  const std::string directory = slash == std::string::npos ? "" : path.substr(0, slash + 1);
+  const std::string directory = DirectoryOf(path);
   std::random_device seed;
   std::minstd_rand random(seed());
   for (int attempt = 0; attempt < 100; ++attempt) {
@@ -79,11 +110,24 @@ bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* 
   bool opened_here = false;
   if (opened == nullptr) opened = &opened_here;
   struct stat status;
-  const bool exists = ::lstat(path.c_str(), &status) == 0;
+  const bool exists = ::stat(path.c_str(), &status) == 0;
   if (exists && !S_ISREG(status.st_mode)) return WriteFileInPlace(path, bytes, opened, err);
+  // Through symbolic links, the file they lead to is replaced and the links
+  // stay. A link whose text leads elsewhere than the kernel's walk (those of
+  // /proc) is written through.
+  std::string target;
+  if (!FinalTarget(path, &target)) {
+    *opened = false;
+    return Fail(err, errno);
+  }
+  struct stat target_status;
+  if (exists && (::stat(target.c_str(), &target_status) != 0 ||
+                 target_status.st_dev != status.st_dev || target_status.st_ino != status.st_ino)) {
+    return WriteFileInPlace(path, bytes, opened, err);
+  }
 
   std::string temporary;
-  FileDescriptor file = CreateTemporary(path, 0644, &temporary);
+  FileDescriptor file = CreateTemporary(target, 0644, &temporary);
   *opened = file.valid();
   if (!file.valid()) return Fail(err, errno);
   // A replaced file keeps its mode; the mode is a courtesy, so a file system
@@ -92,7 +136,7 @@ bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* 
   int error = 0;
   if (!WriteAll(file.get(), bytes)) error = errno;
   if (!file.Close() && error == 0) error = errno;
-  if (error == 0 && ::rename(temporary.c_str(), path.c_str()) != 0) error = errno;
+  if (error == 0 && ::rename(temporary.c_str(), target.c_str()) != 0) error = errno;
   if (error != 0) ::unlink(temporary.c_str());
   temporary_in_progress.store(nullptr);
   return error == 0 || Fail(err, error);

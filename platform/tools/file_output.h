@@ -8,13 +8,15 @@ namespace zor2 {
 // Writes `bytes` to the file at `path` so that the file is never left
 // half-written: a regular file, or a path that does not exist yet, is written
 // to a new temporary file in the same directory (".zor2check." and six random
-// letters, whatever the length of the file's name), which is then renamed over it
-// (a replaced file keeps its permission bits; a new one gets 0644 less the
-// umask). A path that exists and is not a regular file (a symbolic link, a
-// device, a pipe) is opened and written directly. False with the system's
-// reason in `err` when any step fails; the temporary file is then removed.
-// `opened`, when given, tells whether the file (or the temporary one) could be
-// opened at all. Outputs are written one at a time.
+// letters, whatever the length of the file's name), which is then renamed over
+// it (a replaced file keeps its permission bits; a new one gets 0644 less the
+// umask). Through a symbolic link (or a chain of them, the last one possibly
+// dangling) the same is done beside the file the link leads to, and the link
+// stays. A path that leads to something other than a regular file (a device,
+// a pipe) is opened and written directly. False with the system's reason in
+// `err` when any step fails; the temporary file is then removed. `opened`,
+// when given, tells whether the file (or the temporary one) could be opened at
+// all. Outputs are written one at a time.
 bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,
                          std::string* err);
 
