@@ -163,12 +163,24 @@ void RemoveTemporaryFilesOnInterrupt() {
   std::signal(SIGXFSZ, SIG_IGN);
 }
 
+// Opened without blocking: a named pipe that no process reads would hold the
+// run forever, and fails with ENXIO instead. Writes then block as usual.
 bool WriteFileInPlace(const std::string& path, std::string_view bytes, bool* opened,
                       std::string* err) {
   FileDescriptor file(
-      ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NOCTTY | O_CLOEXEC, 0666));
+      ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NONBLOCK | O_NOCTTY | O_CLOEXEC, 0666));
   *opened = file.valid();
-  if (!file.valid()) return Fail(err, errno);
+  if (!file.valid()) {
+    const int error = errno;
+    struct stat status;
+    if (error != ENXIO || ::stat(path.c_str(), &status) != 0 || !S_ISFIFO(status.st_mode)) {
+      return Fail(err, error);
+    }
+    *err = "No process is reading the pipe";
+    return false;
+  }
+  const int flags = ::fcntl(file.get(), F_GETFL);
+  if (flags < 0 || ::fcntl(file.get(), F_SETFL, flags & ~O_NONBLOCK) != 0) return Fail(err, errno);
   if (!WriteAll(file.get(), bytes)) return Fail(err, errno);
   if (!file.Close()) return Fail(err, errno);
   return true;

@@ -13,10 +13,10 @@ namespace zor2 {
 // umask). Through a symbolic link (or a chain of them, the last one possibly
 // dangling) the same is done beside the file the link leads to, and the link
 // stays. A path that leads to something other than a regular file (a device,
-// a pipe) is opened and written directly. False with the system's reason in
-// `err` when any step fails; the temporary file is then removed. `opened`,
-// when given, tells whether the file (or the temporary one) could be opened at
-// all. Outputs are written one at a time.
+// a pipe) is written in place (WriteFileInPlace). False with the system's
+// reason in `err` when any step fails; the temporary file is then removed.
+// `opened`, when given, tells whether the file (or the temporary one) could be
+// opened at all. Outputs are written one at a time.
 bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,
                          std::string* err);
 
@@ -26,8 +26,10 @@ bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* 
 // process (SIGXFSZ ignored). Call once, before any output is written.
 void RemoveTemporaryFilesOnInterrupt();
 
-// Writes `bytes` to the file at `path`, created or truncated, in place. False
-// with the system's reason in `err` when it cannot; `*opened` then tells
+// Writes `bytes` to the file at `path`, created or truncated, in place. The
+// file is opened without blocking: a named pipe that no process reads fails
+// ("No process is reading the pipe"), one with a reader is written as usual.
+// False with the system's reason in `err` when it cannot; `*opened` then tells
 // whether the file could be opened at all.
 bool WriteFileInPlace(const std::string& path, std::string_view bytes, bool* opened,
                       std::string* err);
