@@ -7,8 +7,10 @@
 #include <vector>
 
 #include "documents/exports.h"
+#include "driver/output_clash.h"
 #include "platform/tools/argument_file.h"
 #include "platform/tools/log.h"
+#include "platform/tools/printable_path.h"
 #include "rules/attribute_values.h"
 
 namespace zor2 {
@@ -55,7 +57,7 @@ bool CollectItems(int argc, const char* const* argv, std::string_view program,
                   std::vector<std::string>* items) {
   std::string err;
   if (argc == 3 && std::strcmp(argv[1], "=") == 0 && !ReadArgumentFile(argv[2], items, &err)) {
-    WriteLine(stderr, {program, ": unable to read file ", argv[2]});
+    WriteLine(stderr, {program, ": unable to read file ", PrintablePath(argv[2])});
     return false;
   }
   // An argument file without any item counts as no argument file.
@@ -82,7 +84,12 @@ bool TakeValue(const std::string& option, const std::string& value, OptionScan* 
     return true;
   }
   if (option == "-htm") {
-    config->help_page_path = value;
+    // An empty path, as an unset shell variable gives, asks for no page.
+    if (value.empty()) {
+      config->help_page_path.reset();
+    } else {
+      config->help_page_path = value;
+    }
     return true;
   }
   if (option == "-baseline") {
@@ -149,9 +156,9 @@ void CheckMandatoryOptions(OptionScan* scan) {
 }
 
 void AnnounceRun(const RunConfiguration& config, Log& log) {
-  log.Progress() << "## Ref : " << config.reference_path;
-  log.Progress() << "## Checked : " << config.checked_path;
-  log.Progress() << "## Output : " << config.output_path;
+  log.Progress() << "## Ref : " << PrintablePath(config.reference_path);
+  log.Progress() << "## Checked : " << PrintablePath(config.checked_path);
+  log.Progress() << "## Output : " << PrintablePath(config.output_path);
 }
 
 void FixLevel(const std::optional<std::string>& level_text, CheckSettings* settings, Log& log) {
@@ -182,6 +189,14 @@ std::optional<ExitStatus> ReadCommandLine(int argc, const char* const* argv,
   config->items = items;
   if (std::optional<ExitStatus> help = ScanOptions(items, &scan, config)) return help;
   CheckMandatoryOptions(&scan);
+  // An output that names an input would destroy it: refused before anything
+  // is read or written.
+  if (!scan.failed) {
+    if (std::optional<std::string> clash = FindOutputClash(*config)) {
+      WriteLine(stderr, {scan.program, ": ", *clash});
+      scan.failed = true;
+    }
+  }
   if (scan.failed) {
     WriteLine(stderr, {kUsage});
     return ExitStatus::kUsageError;

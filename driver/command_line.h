@@ -14,7 +14,7 @@ struct RunConfiguration {
   std::string reference_path;                 // "-r": a document or a directory of documents
   std::string checked_path;                   // "-c": likewise
   std::string output_path;                    // "-o": the report
-  std::optional<std::string> help_page_path;  // "-htm"
+  std::optional<std::string> help_page_path;  // "-htm", unless given ""
   CheckSettings settings;                     // "-L" and "-level"
   bool summary = false;                       // "-summary", also set by "-fail"
   bool fail = false;                          // "-fail": status 3 for findings not accepted
@@ -26,7 +26,8 @@ struct RunConfiguration {
 // Reads the program's arguments (`argv[0]` is the program name; `argv` holds
 // `argc` entries), or the items of the argument file named by the two
 // arguments "=" and a path. Usage errors go to standard error, the "-h" text
-// to standard output. When the run may go on, fills `config`, writes the
+// to standard output. An output that is the same file as an input document or
+// as the other output is a usage error. When the run may go on, fills `config`, writes the
 // banner and the level to the standard log and returns nothing; otherwise
 // returns the status the process must end with (a usage error, an unreadable
 // argument file, or "-h").

@@ -18,6 +18,7 @@
 #include <sys/stat.h>
 
 #include <cerrno>
+#include <csignal>
 #include <cstring>
 #include <future>
 #include <iterator>
@@ -36,6 +37,7 @@
 #include "platform/tools/file_output.h"
 #include "platform/tools/log.h"
 #include "platform/tools/paths.h"
+#include "platform/tools/printable_path.h"
 #include "platform/xml/output_element.h"
 #include "rules/framework_comparison.h"
 
@@ -81,7 +83,7 @@ class ComparisonRun {
   // Names `path` and why it failed in an "ERROR: " line; the run's result is
   // then incomplete. Every failure of a run is reported here.
   void ReportFailure(const std::string& path, const std::string& reason) {
-    log_.Warning() << "ERROR: " << path << ": " << reason;
+    log_.Warning() << "ERROR: " << PrintablePath(path) << ": " << reason;
     incomplete_ = true;
   }
 
@@ -123,31 +125,25 @@ class ComparisonRun {
     const bool checked_known = CheckInputKind(checked);
     if (!reference_known || !checked_known) return;
     if (IsDirectory(checked)) {
-      ReportFailure(checked, "Is a directory, but the reference " + reference + " is a file");
+      ReportFailure(checked,
+                    "Is a directory, but the reference " + PrintablePath(reference) + " is a file");
     } else {
-      ReportFailure(checked, "Not a directory, but the reference " + reference + " is a directory");
+      ReportFailure(checked, "Not a directory, but the reference " + PrintablePath(reference) +
+                                 " is a directory");
     }
   }
 
   // Pairs each reference document with the checked document of the same name;
-  // a reference document without one is passed over silently.
+  // a reference document without one is passed over, and only counted for the
+  // summary.
   void CompareDirectories() {
-    std::vector<std::string> entries;
-    std::string err;
-    if (!ListRegularFiles(config_.reference_path, &entries, &err)) {
-      ReportFailure(config_.reference_path, "cannot list the directory");
-      return;
-    }
     std::vector<PairReader::Paths> pairs;
     summary_.directory_mode = true;
-    for (std::string& entry : entries) {
-      std::string name = BaseName(entry);
-      std::string checked = JoinPath(config_.checked_path, name);
-      if (IsRegularFile(checked)) {
-        pairs.push_back({std::move(entry), std::move(checked)});
-      } else {
-        summary_.missing_counterparts.push_back(std::move(name));
-      }
+    std::string err;
+    if (!ListDocumentPairs(config_.reference_path, config_.checked_path, &pairs,
+                           &summary_.missing_counterparts, &err)) {
+      ReportFailure(config_.reference_path, err);
+      return;
     }
     PairReader reader(std::move(pairs), KeepOriginals());
     while (reader.HasNext()) ComparePair(reader.Next());
@@ -226,33 +222,27 @@ class ComparisonRun {
     summary_.failed = summary_.not_accepted > 0;
   }
 
-  // Each export is made and written on a thread of its own while the report
-  // is written; they only read the findings, which no longer change. Each
-  // task answers why its export could not be written, or nothing.
+  // Each export is made on a thread of its own while the report is written;
+  // they only read the findings, which no longer change. The files are
+  // written afterwards, one at a time, as every output is.
   std::vector<std::future<std::string>> StartExports() {
     std::vector<std::future<std::string>> exports;
     if (config_.export_paths.empty()) return exports;
     run_ = RunDescription{kToolVersion, config_.reference_path, config_.checked_path,
                           config_.output_path, config_.items};
     for (const std::string& path : config_.export_paths) {
-      exports.push_back(RunInBackground([this, &path] {
-        std::string err;
-        if (WriteFileAtomically(path, ExportText(*ExportFormatOf(path), run_, summary_, findings_),
-                                &err)) {
-          return std::string();
-        }
-        return err.empty() ? std::string("cannot be written") : err;
-      }));
+      exports.push_back(RunInBackground(
+          [this, &path] { return ExportText(*ExportFormatOf(path), run_, summary_, findings_); }));
     }
     return exports;
   }
 
-  // Names the exports that could not be written, in the order they were asked
-  // for.
+  // Writes the exports, in the order they were asked for.
   void FinishExports(std::vector<std::future<std::string>>& exports) {
     for (size_t i = 0; i < exports.size(); ++i) {
-      const std::string err = exports[i].get();
-      if (!err.empty()) ReportFailure(config_.export_paths[i], err);
+      const std::string& path = config_.export_paths[i];
+      std::string err;
+      if (!WriteFileAtomically(path, exports[i].get(), nullptr, &err)) ReportFailure(path, err);
     }
   }
 
@@ -266,15 +256,14 @@ class ComparisonRun {
   void WriteHelpPage() {
     if (!config_.help_page_path) return;
     const std::string& path = *config_.help_page_path;
+    // Written as the report is, so that a failed write leaves any earlier page
+    // whole.
     bool opened = false;
     std::string err;
-    if (WriteFileInPlace(path, HelpPageText(), &opened, &err)) return;
-    if (opened) {
-      ReportFailure(path, err);
-    } else {
-      log_.Warning() << "Unable to open file " << path;
-      incomplete_ = true;
-    }
+    if (WriteFileAtomically(path, HelpPageText(), &opened, &err)) return;
+    // The page's long-standing line comes first when it cannot even be opened.
+    if (!opened) log_.Warning() << "Unable to open file " << PrintablePath(path);
+    ReportFailure(path, err);
   }
 
   const RunConfiguration& config_;
@@ -296,6 +285,10 @@ ExitStatus RunComparison(const RunConfiguration& config) {
 }
 
 ExitStatus RunProgram(int argc, const char* const* argv) {
+  // A log stream whose reader has gone (a closed pipe) fails its writes
+  // instead of ending the process: the report is still written.
+  std::signal(SIGPIPE, SIG_IGN);
+  RemoveTemporaryFilesOnInterrupt();
   RunConfiguration config;
   std::optional<ExitStatus> ended = ReadCommandLine(argc, argv, &config);
   return ended ? *ended : RunComparison(config);

@@ -1,21 +1,29 @@
 #include "driver/pair_loading.h"
 
 #include <filesystem>
+#include <new>
 #include <system_error>
 
 #include "documents/type_name_normalization.h"
 #include "platform/tools/background.h"
+#include "platform/tools/paths.h"
 #include "platform/tools/xml_escaping.h"
 #include "platform/xml/reader.h"
 
 namespace zor2 {
 namespace {
 
-// Touches nothing but its own document, so that loads can run at once.
+// Touches nothing but its own document, so that loads can run at once. A
+// document that does not fit in memory is a fault of its pair only.
 LoadedDocument LoadDocument(const std::string& path, bool keep_originals) {
   LoadedDocument loaded{path, nullptr, {}, xml::OriginalValues(MayNormalizeTypeNames)};
-  if (xml::ReadDocumentFile(path, &loaded.document, &loaded.error)) {
-    loaded.document->RewriteValues(PrepareValue, keep_originals ? &loaded.originals : nullptr);
+  try {
+    if (xml::ReadDocumentFile(path, &loaded.document, &loaded.error)) {
+      loaded.document->RewriteValues(PrepareValue, keep_originals ? &loaded.originals : nullptr);
+    }
+  } catch (const std::bad_alloc&) {
+    loaded.document.reset();
+    loaded.error = xml::ReadError{xml::kNotEnoughMemory, 0, 0};
   }
   return loaded;
 }
@@ -40,6 +48,23 @@ bool PrepareValue(std::string_view value, std::string* rewritten) {
   std::string normalized;
   if (!NormalizeTypeNames(value, &normalized)) return DecodeXmlReferences(value, rewritten);
   if (!DecodeXmlReferences(normalized, rewritten)) *rewritten = std::move(normalized);
+  return true;
+}
+
+bool ListDocumentPairs(const std::string& reference_dir, const std::string& checked_dir,
+                       std::vector<PairReader::Paths>* pairs, std::vector<std::string>* missing,
+                       std::string* err) {
+  std::vector<std::string> entries;
+  if (!ListRegularFiles(reference_dir, &entries, err)) return false;
+  for (std::string& entry : entries) {
+    std::string name = BaseName(entry);
+    std::string checked = JoinPath(checked_dir, name);
+    if (IsRegularFile(checked)) {
+      pairs->push_back({std::move(entry), std::move(checked)});
+    } else if (missing != nullptr) {
+      missing->push_back(std::move(name));
+    }
+  }
   return true;
 }
 

@@ -90,4 +90,13 @@ class PairReader {
   uintmax_t bytes_ahead_ = 0;
 };
 
+// Appends the pairs of a directory run to `pairs`: each regular file of
+// `reference_dir` whose name is also a regular file of `checked_dir`, in the
+// order of the listing; the names of the others go to `missing` unless it is
+// null. False with the system's reason in `err` when `reference_dir` cannot be
+// listed.
+bool ListDocumentPairs(const std::string& reference_dir, const std::string& checked_dir,
+                       std::vector<PairReader::Paths>* pairs, std::vector<std::string>* missing,
+                       std::string* err);
+
 }  // namespace zor2

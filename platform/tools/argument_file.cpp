@@ -5,6 +5,8 @@
 
 #include <cerrno>
 #include <cstring>
+#include <iterator>
+#include <new>
 
 #include "platform/tools/file_descriptor.h"
 
@@ -36,14 +38,9 @@ bool IsBlank(char c) {
   return c == ' ' || c == '\t' || c == '\r' || c == '\n';
 }
 
-}  // namespace
-
-bool ReadArgumentFile(const std::string& path, std::vector<std::string>* items, std::string* err) {
-  std::string content;
-  if (!ReadWholeFile(path, &content)) {
-    *err = std::strerror(errno);
-    return false;
-  }
+// Quotes may open and close anywhere inside an item ("a b"c gives `a bc`); an
+// unterminated quote runs to the end of the file.
+void SplitItems(const std::string& content, std::vector<std::string>* items) {
   std::string item;
   bool in_item = false;
   bool quoted = false;
@@ -61,6 +58,27 @@ bool ReadArgumentFile(const std::string& path, std::vector<std::string>* items, 
     }
   }
   if (in_item) items->push_back(std::move(item));
+}
+
+}  // namespace
+
+bool ReadArgumentFile(const std::string& path, std::vector<std::string>* items, std::string* err) {
+  // A file that does not fit in memory (one that never ends, as /dev/zero)
+  // cannot be read either.
+  try {
+    std::string content;
+    if (!ReadWholeFile(path, &content)) {
+      *err = std::strerror(errno);
+      return false;
+    }
+    std::vector<std::string> read;
+    SplitItems(content, &read);
+    items->insert(items->end(), std::make_move_iterator(read.begin()),
+                  std::make_move_iterator(read.end()));
+  } catch (const std::bad_alloc&) {
+    *err = std::strerror(ENOMEM);
+    return false;
+  }
   return true;
 }
 

@@ -10,7 +10,7 @@ namespace zor2 {
 // blanks inside one item, the quotes removed ("a b"c gives `a bc`; "" alone is
 // an empty item; an unterminated quote runs to the end of the file). A file of
 // white space only gives no item. False with the system's reason in `err` when
-// the file cannot be read (nothing is appended then).
+// the file cannot be read or does not fit in memory (nothing is appended then).
 bool ReadArgumentFile(const std::string& path, std::vector<std::string>* items, std::string* err);
 
 }  // namespace zor2

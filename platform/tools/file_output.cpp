@@ -4,7 +4,9 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <atomic>
 #include <cerrno>
+#include <csignal>
 #include <cstring>
 #include <random>
 
@@ -12,6 +14,18 @@
 
 namespace zor2 {
 namespace {
+
+// The temporary file being written, for the signal handler: outputs are
+// written one at a time.
+std::atomic<const char*> temporary_in_progress{nullptr};
+static_assert(std::atomic<const char*>::is_always_lock_free, "read by a signal handler");
+
+extern "C" void EndInterruptedRun(int signal_number) {
+  if (const char* temporary = temporary_in_progress.load()) ::unlink(temporary);
+  // The handler was reset on entry: ending by the signal itself tells the
+  // parent how the run ended (a shell shows 128 and its number).
+  ::raise(signal_number);
+}
 
 bool Fail(std::string* err, int error_number) {
   *err = std::strerror(error_number);
@@ -30,19 +44,60 @@ bool WriteAll(int fd, std::string_view bytes) {
   return true;
 }
 
-// Creates a new file named `path` followed by a random suffix, with `mode`
-// (less the umask); sets `temporary` to its name.
+// The directory part of `path`, with its final "/", or "" for a bare name.
+std::string DirectoryOf(const std::string& path) {
+  const size_t slash = path.rfind('/');
+  return slash == std::string::npos ? "" : path.substr(0, slash + 1);
+}
+
+// Sets `target` to the file that `path` finally names, its symbolic links
+// followed (the last one may dangle), or to `path` when it is no link. False
+// with errno set when a link cannot be read or the links loop.
+bool FinalTarget(const std::string& path, std::string* target) {
+  *target = path;
+  // The kernel's own limit on the links of one path.
+  for (int links = 0; links < 40; ++links) {
+    struct stat status;
+    if (::lstat(target->c_str(), &status) != 0 || !S_ISLNK(status.st_mode)) return true;
+    std::string text(256, '\0');
+    for (;;) {
+      const ssize_t length = ::readlink(target->c_str(), text.data(), text.size());
+      if (length < 0) return false;
+      if (static_cast<size_t>(length) < text.size()) {
+        text.resize(static_cast<size_t>(length));
+        break;
+      }
+      text.resize(text.size() * 2);
+    }
+    // A relative link is read from the directory that holds it.
+    *target = !text.empty() && text[0] == '/' ? text : DirectoryOf(*target) + text;
+  }
+  errno = ELOOP;
+  return false;
+}
+
+// Creates a new file in the directory of `path`, with `mode` (less the
+// umask); sets `temporary` to its name. The name is short and hidden,
+// ".zor2check." and six random letters, so that it fits wherever `path`'s
+// name fits and stays out of listings.
 FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string* temporary) {
   static constexpr char kLetters[] =
       "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789";
+  const std::string directory = DirectoryOf(path);
   std::random_device seed;
   std::minstd_rand random(seed());
   for (int attempt = 0; attempt < 100; ++attempt) {
-    *temporary = path + ".tmp";
-    for (int i = 0; i < 6; ++i) *temporary += kLetters[random() % (sizeof kLetters - 1)];
+    std::string name = directory + ".zor2check.";
+    for (int i = 0; i < 6; ++i) name += kLetters[random() % (sizeof kLetters - 1)];
+    // Published before it exists, so that no signal can leave it behind.
+    temporary_in_progress.store(nullptr);
+    *temporary = std::move(name);
+    temporary_in_progress.store(temporary->c_str());
     FileDescriptor file(
         ::open(temporary->c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOCTTY | O_CLOEXEC, mode));
-    if (file.valid() || errno != EEXIST) return file;
+    if (file.valid()) return file;
+    temporary_in_progress.store(nullptr);
+    if (errno != EEXIST) return file;
   }
   errno = EEXIST;
   return FileDescriptor(-1);
@@ -50,14 +105,30 @@ FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string
 
 }  // namespace
 
-bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::string* err) {
+bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,
+                         std::string* err) {
+  bool opened_here = false;
+  if (opened == nullptr) opened = &opened_here;
   struct stat status;
-  const bool exists = ::lstat(path.c_str(), &status) == 0;
-  bool opened;
-  if (exists && !S_ISREG(status.st_mode)) return WriteFileInPlace(path, bytes, &opened, err);
+  const bool exists = ::stat(path.c_str(), &status) == 0;
+  if (exists && !S_ISREG(status.st_mode)) return WriteFileInPlace(path, bytes, opened, err);
+  // Through symbolic links, the file they lead to is replaced and the links
+  // stay. A link whose text leads elsewhere than the kernel's walk (those of
+  // /proc) is written through.
+  std::string target;
+  if (!FinalTarget(path, &target)) {
+    *opened = false;
+    return Fail(err, errno);
+  }
+  struct stat target_status;
+  if (exists && (::stat(target.c_str(), &target_status) != 0 ||
+                 target_status.st_dev != status.st_dev || target_status.st_ino != status.st_ino)) {
+    return WriteFileInPlace(path, bytes, opened, err);
+  }
 
   std::string temporary;
-  FileDescriptor file = CreateTemporary(path, 0644, &temporary);
+  FileDescriptor file = CreateTemporary(target, 0644, &temporary);
+  *opened = file.valid();
   if (!file.valid()) return Fail(err, errno);
   // A replaced file keeps its mode; the mode is a courtesy, so a file system
   // that refuses it does not fail the write.
@@ -65,18 +136,51 @@ bool WriteFileAtomically(const std::string& path, std::string_view bytes, std::s
   int error = 0;
   if (!WriteAll(file.get(), bytes)) error = errno;
   if (!file.Close() && error == 0) error = errno;
-  if (error == 0 && ::rename(temporary.c_str(), path.c_str()) != 0) error = errno;
-  if (error == 0) return true;
-  ::unlink(temporary.c_str());
-  return Fail(err, error);
+  if (error == 0 && ::rename(temporary.c_str(), target.c_str()) != 0) error = errno;
+  if (error != 0) ::unlink(temporary.c_str());
+  temporary_in_progress.store(nullptr);
+  return error == 0 || Fail(err, error);
 }
 
+void RemoveTemporaryFilesOnInterrupt() {
+  struct sigaction action = {};
+  action.sa_handler = EndInterruptedRun;
+  action.sa_flags = SA_RESETHAND;
+  sigemptyset(&action.sa_mask);
+  sigaddset(&action.sa_mask, SIGINT);
+  sigaddset(&action.sa_mask, SIGTERM);
+  for (int signal_number : {SIGINT, SIGTERM}) {
+    // A run started with the signal ignored (a background job, nohup) keeps
+    // ignoring it.
+    struct sigaction current;
+    if (::sigaction(signal_number, nullptr, &current) == 0 && current.sa_handler == SIG_IGN) {
+      continue;
+    }
+    ::sigaction(signal_number, &action, nullptr);
+  }
+  // A write past the file size limit then fails with EFBIG, like any other
+  // failed write, instead of ending the run.
+  std::signal(SIGXFSZ, SIG_IGN);
+}
+
+// Opened without blocking: a named pipe that no process reads would hold the
+// run forever, and fails with ENXIO instead. Writes then block as usual.
 bool WriteFileInPlace(const std::string& path, std::string_view bytes, bool* opened,
                       std::string* err) {
   FileDescriptor file(
-      ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NOCTTY | O_CLOEXEC, 0666));
+      ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_NONBLOCK | O_NOCTTY | O_CLOEXEC, 0666));
   *opened = file.valid();
-  if (!file.valid()) return Fail(err, errno);
+  if (!file.valid()) {
+    const int error = errno;
+    struct stat status;
+    if (error != ENXIO || ::stat(path.c_str(), &status) != 0 || !S_ISFIFO(status.st_mode)) {
+      return Fail(err, error);
+    }
+    *err = "No process is reading the pipe";
+    return false;
+  }
+  const int flags = ::fcntl(file.get(), F_GETFL);
+  if (flags < 0 || ::fcntl(file.get(), F_SETFL, flags & ~O_NONBLOCK) != 0) return Fail(err, errno);
   if (!WriteAll(file.get(), bytes)) return Fail(err, errno);
   if (!file.Close()) return Fail(err, errno);
   return true;

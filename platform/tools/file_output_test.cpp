@@ -24,12 +24,12 @@ TEST_F(FileOutputTest, ReplacesFilesKeepingTheirModeAndWritesThroughLinks) {
   ASSERT_EQ(chmod(path.c_str(), 0600), 0);
   ASSERT_EQ(symlink(path.c_str(), link.c_str()), 0);
   std::string err;
-  ASSERT_TRUE(WriteFileAtomically(path, "new", &err)) << err;
+  ASSERT_TRUE(WriteFileAtomically(path, "new", nullptr, &err)) << err;
   struct stat status;
   ASSERT_EQ(stat(path.c_str(), &status), 0);
   EXPECT_EQ(status.st_mode & 07777, 0600u);
   EXPECT_EQ(Contents(path), "new");
-  ASSERT_TRUE(WriteFileAtomically(link, "through", &err)) << err;
+  ASSERT_TRUE(WriteFileAtomically(link, "through", nullptr, &err)) << err;
   ASSERT_EQ(lstat(link.c_str(), &status), 0);
   EXPECT_TRUE(S_ISLNK(status.st_mode));
   EXPECT_EQ(Contents(path), "through");

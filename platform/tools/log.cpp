@@ -18,10 +18,16 @@ void Log::Write(LogStream stream, std::string text) {
     held_.push_back({stream, std::move(text)});
     return;
   }
-  std::FILE* file = stream == LogStream::kProgress ? stdout : stderr;
+  const bool progress = stream == LogStream::kProgress;
+  // A stream that failed once (a closed pipe, a full disk) is not written to
+  // again: the run goes on without it.
+  bool& failed = progress ? progress_failed_ : warnings_failed_;
+  if (failed) return;
+  std::FILE* file = progress ? stdout : stderr;
   text += '\n';
-  std::fwrite(text.data(), 1, text.size(), file);
-  std::fflush(file);
+  if (std::fwrite(text.data(), 1, text.size(), file) != text.size() || std::fflush(file) != 0) {
+    failed = true;
+  }
 }
 
 void Log::ReplayInto(Log& target) {

@@ -55,7 +55,8 @@ class Log {
 
   // The log that writes each line at once to standard output or standard
   // error, flushing it there, so that the lines of the two streams keep their
-  // order when both go to the same place.
+  // order when both go to the same place. A stream that cannot be written (a
+  // closed pipe) is given up after its first failure.
   static Log& Standard();
 
   LogLine Progress() { return LogLine(this, LogStream::kProgress); }
@@ -76,6 +77,8 @@ class Log {
 
   bool standard_ = false;
   std::vector<Line> held_;
+  bool progress_failed_ = false;  // of the standard log's streams
+  bool warnings_failed_ = false;
 };
 
 }  // namespace zor2

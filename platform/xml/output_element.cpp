@@ -84,7 +84,7 @@ void AppendDocument(const OutputElement& root, std::string* out) {
 bool WriteDocument(const OutputElement& root, const std::string& path, std::string* err) {
   std::string text;
   AppendDocument(root, &text);
-  return WriteFileAtomically(path, text, err);
+  return WriteFileAtomically(path, text, nullptr, err);
 }
 
 }  // namespace zor2::xml

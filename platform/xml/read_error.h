@@ -13,4 +13,7 @@ struct ReadError {
   int column = 0;
 };
 
+// Why a document could not be held in memory.
+inline constexpr char kNotEnoughMemory[] = "not enough memory to read the document";
+
 }  // namespace zor2::xml

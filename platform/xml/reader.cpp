@@ -2,34 +2,46 @@
 
 #include <fcntl.h>
 #include <strings.h>
+#include <sys/resource.h>
 #include <sys/stat.h>
+#include <sys/sysinfo.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
+#include <cstdint>
 #include <cstring>
+#include <limits>
 #include <string>
 #include <unordered_set>
 #include <vector>
 
 #include "platform/tools/file_descriptor.h"
 #include "platform/xml/text_encoding.h"
+#include "platform/xml/xml_characters.h"
 
 namespace zor2::xml {
 namespace {
 
-enum CharacterClass : unsigned char { kSpace = 1, kNameStart = 2, kNameChar = 4 };
+enum CharacterClass : unsigned char {
+  kSpace = 1,
+  kNameStart = 2,
+  kNameChar = 4,
+  kAsciiNameChar = 8,
+};
 
 // XML names, with "@" allowed anywhere; every byte of a multi-byte UTF-8
-// character counts as a name character.
+// character counts as a name character, but for kAsciiNameChar.
 constexpr std::array<unsigned char, 256> kClasses = [] {
   std::array<unsigned char, 256> classes{};
   for (int c = 0; c < 256; ++c) {
-    bool start = (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == '_' || c == ':' ||
-                 c == '@' || c >= 0x80;
-    bool name = start || (c >= '0' && c <= '9') || c == '-' || c == '.';
+    bool ascii_start =
+        (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == '_' || c == ':' || c == '@';
+    bool ascii_name = ascii_start || (c >= '0' && c <= '9') || c == '-' || c == '.';
     bool space = c == ' ' || c == '\t' || c == '\n' || c == '\r';
-    classes[c] = (space ? kSpace : 0) | (start ? kNameStart : 0) | (name ? kNameChar : 0);
+    classes[c] = (space ? kSpace : 0) | (ascii_start || c >= 0x80 ? kNameStart : 0) |
+                 (ascii_name || c >= 0x80 ? kNameChar : 0) | (ascii_name ? kAsciiNameChar : 0);
   }
   return classes;
 }();
@@ -49,12 +61,15 @@ inline char* SkipName(char* p) {
 }
 
 // Where the scan of an attribute value stops: at its closing quote, at "<"
-// (not allowed in a value) and at a zero byte (the end sentinel, or a zero in
-// the text).
+// (not allowed in a value), at a zero byte (the end sentinel, or a zero in the
+// text), and at what must be examined before the value may reach a report: a
+// reference, a control character and the first byte of a non-ASCII character.
 template <char kQuote>
 constexpr std::array<bool, 256> kValueStops = [] {
   std::array<bool, 256> stops{};
-  stops[static_cast<unsigned char>(kQuote)] = stops['<'] = stops[0] = true;
+  stops[static_cast<unsigned char>(kQuote)] = stops['<'] = stops['&'] = true;
+  for (int c = 0; c < 0x20; ++c) stops[c] = c != '\t' && c != '\n' && c != '\r';
+  for (int c = 0x80; c < 0x100; ++c) stops[c] = true;
   return stops;
 }();
 
@@ -78,6 +93,13 @@ char* Find(char* from, char* end, std::string_view text) {
   return static_cast<char*>(memmem(from, end - from, text.data(), text.size()));
 }
 
+int DigitValue(char c, int base) {
+  if (c >= '0' && c <= '9') return c - '0';
+  if (base == 16 && c >= 'a' && c <= 'f') return c - 'a' + 10;
+  if (base == 16 && c >= 'A' && c <= 'F') return c - 'A' + 10;
+  return -1;
+}
+
 // Up to this many attributes, an element's names are compared pairwise; past
 // it a hash set keeps the duplicate check linear.
 constexpr size_t kPairwiseLimit = 16;
@@ -86,8 +108,9 @@ constexpr size_t kPairwiseLimit = 16;
 
 // One pass over a document's text. The parser writes into the text only
 // inside start tags (see document_storage.h), and never moves a byte other than
-// the tag's, so a position keeps its line and column; the only line feeds it
-// overwrites (after an attribute name) are remembered in hidden_newlines_.
+// the tag's, so a position keeps its line and column; the only line ends it
+// overwrites (after an attribute name) are remembered in hidden_line_ends_ and
+// put back before a fault is located.
 class Parser {
  public:
   // Parses `text` into a new document.
@@ -109,7 +132,8 @@ class Parser {
   bool Run(ReadError* err) {
     if (ParseDocument()) return true;
     err->reason = std::move(reason_);
-    LocateInText(begin_, fault_, hidden_newlines_, &err->line, &err->column);
+    for (const HiddenLineEnd& hidden : hidden_line_ends_) begin_[hidden.offset] = hidden.byte;
+    LocateInText(begin_, fault_, &err->line, &err->column);
     return false;
   }
 
@@ -117,6 +141,12 @@ class Parser {
   bool ParseMarkup(char* lt);
   bool ParseStartTag(char* lt);
   bool ParseAttribute();
+  template <char kQuote>
+  char* ScanCheckedValue(char* value);
+  bool CheckValueStop(char*& p);
+  bool CheckReference(const char* amp);
+  char* ScanName(char* p);
+  bool SkipNonAscii(char*& p);
   bool RememberAttributeName(std::string_view name);
   bool ParseEndTag(char* lt);
   bool ParseDeclaration(char* lt);
@@ -151,7 +181,11 @@ class Parser {
   std::vector<std::string_view> attribute_names_;
   std::unordered_set<std::string_view> attribute_set_;
   bool attribute_set_used_ = false;
-  std::vector<size_t> hidden_newlines_;
+  struct HiddenLineEnd {
+    size_t offset;
+    char byte;
+  };
+  std::vector<HiddenLineEnd> hidden_line_ends_;
   const char* fault_ = nullptr;
   std::string reason_;
 };
@@ -198,7 +232,8 @@ bool Parser::ParseStartTag(char* lt) {
   if (root_closed_) return Fail(lt, "more than one root element");
   char* name = lt + 1;
   if (!Is(*name, kNameStart)) return Expected(name, "an element name after '<'");
-  char* name_end = SkipName(name + 1);
+  char* name_end = ScanName(name);
+  if (name_end == nullptr) return false;
   // The tag moves one byte left, over the "<", so that its zero terminator
   // does not overwrite the character after it.
   size_t length = name_end - name;
@@ -248,7 +283,8 @@ bool Parser::ParseStartTag(char* lt) {
 
 bool Parser::ParseAttribute() {
   char* name = p_;
-  char* name_end = SkipName(name + 1);
+  char* name_end = ScanName(name);
+  if (name_end == nullptr) return false;
   std::string_view name_text(name, name_end - name);
   char* p = SkipSpace(name_end);
   if (*p != '=') return Expected(p, "'=' after attribute name \"" + std::string(name_text) + "\"");
@@ -256,18 +292,88 @@ bool Parser::ParseAttribute() {
   char quote = *p;
   if (quote != '"' && quote != '\'') return Expected(p, "a quoted attribute value");
   char* value = p + 1;
-  char* close = quote == '"' ? ScanValue<'"'>(value) : ScanValue<'\''>(value);
-  if (*close != quote) {
-    if (*close == '<') return Fail(close, "'<' is not allowed in an attribute value");
-    return Expected(close, "the closing quote of the attribute value");
-  }
+  char* close = quote == '"' ? ScanCheckedValue<'"'>(value) : ScanCheckedValue<'\''>(value);
+  if (close == nullptr) return false;
   if (!RememberAttributeName(name_text)) {
     return Fail(name, "duplicate attribute \"" + std::string(name_text) + "\"");
   }
-  if (*name_end == '\n') hidden_newlines_.push_back(name_end - begin_);
+  if (*name_end == '\n' || *name_end == '\r') {
+    hidden_line_ends_.push_back({static_cast<size_t>(name_end - begin_), *name_end});
+  }
   *name_end = '\0';
   *close = '\0';
   p_ = close + 1;
+  return true;
+}
+
+// Returns the closing quote of the value that starts at `value`, or null
+// with the fault set.
+template <char kQuote>
+char* Parser::ScanCheckedValue(char* value) {
+  char* p = ScanValue<kQuote>(value);
+  while (*p != kQuote) {
+    if (!CheckValueStop(p)) return nullptr;
+    p = ScanValue<kQuote>(p);
+  }
+  return p;
+}
+
+// At a stop of the value scan other than the closing quote: fails, or moves
+// `p` past what it examined.
+bool Parser::CheckValueStop(char*& p) {
+  const unsigned char c = static_cast<unsigned char>(*p);
+  if (c == '<') return Fail(p, "'<' is not allowed in an attribute value");
+  if (c == 0) return Expected(p, "the closing quote of the attribute value");
+  if (c == '&') return CheckReference(p++);
+  if (c < 0x20) return Fail(p, "character " + CodePointName(c) + " is not allowed in XML");
+  return SkipNonAscii(p);
+}
+
+// A character reference to a character that XML does not allow is a fault;
+// anything else after "&" is left to the decoding of values, as written.
+bool Parser::CheckReference(const char* amp) {
+  if (amp[1] != '#') return true;
+  const char* p = amp + 2;
+  int base = 10;
+  if (*p == 'x') {
+    base = 16;
+    ++p;
+  }
+  const char* digits = p;
+  char32_t code_point = 0;
+  bool too_large = false;
+  for (int digit; (digit = DigitValue(*p, base)) >= 0; ++p) {
+    // Past the Unicode range the value is only marked, so it cannot overflow.
+    if (!too_large) code_point = code_point * base + digit;
+    if (code_point > 0x10FFFF) too_large = true;
+  }
+  if (p == digits || *p != ';') return true;
+  if (too_large) return Fail(amp, "character reference beyond U+10FFFF is not allowed in XML");
+  if (IsXmlCharacter(code_point)) return true;
+  return Fail(amp,
+              "character reference to " + CodePointName(code_point) + " is not allowed in XML");
+}
+
+// Returns the end of the name that starts at `p` (whose first character was
+// checked), or null with the fault set when a non-ASCII character of it is
+// not well-formed UTF-8 or not allowed in XML.
+char* Parser::ScanName(char* p) {
+  for (;;) {
+    while (Is(*p, kAsciiNameChar)) ++p;
+    if (static_cast<unsigned char>(*p) < 0x80) return p;
+    if (!SkipNonAscii(p)) return nullptr;
+  }
+}
+
+// Moves `p` past the non-ASCII character there, or fails.
+bool Parser::SkipNonAscii(char*& p) {
+  char32_t code_point;
+  const size_t length = DecodeUtf8(p, &code_point);
+  if (length == 0) return Fail(p, "invalid UTF-8 byte sequence");
+  if (!IsXmlCharacter(code_point)) {
+    return Fail(p, "character " + CodePointName(code_point) + " is not allowed in XML");
+  }
+  p += length;
   return true;
 }
 
@@ -403,17 +509,45 @@ bool Refuse(ReadError* err, int error_number) {
   return false;
 }
 
-// Reads the file at `path` in one piece into `text`, with spare capacity
-// after it for values that preparation makes longer.
+// The most memory the process could ever hold: the machine's memory and swap,
+// or less when the process is limited.
+uintmax_t MemoryLimit() {
+  uintmax_t limit = std::numeric_limits<uintmax_t>::max();
+  struct sysinfo machine;
+  if (::sysinfo(&machine) == 0) {
+    limit = (uintmax_t{machine.totalram} + machine.totalswap) * machine.mem_unit;
+  }
+  for (int resource : {RLIMIT_AS, RLIMIT_DATA}) {
+    struct rlimit process;
+    if (::getrlimit(resource, &process) == 0 && process.rlim_cur != RLIM_INFINITY) {
+      limit = std::min<uintmax_t>(limit, process.rlim_cur);
+    }
+  }
+  return limit;
+}
+
+// Reads the regular file at `path` in one piece into `text`, with spare
+// capacity after it for values that preparation makes longer. It is opened
+// without blocking, since a named pipe (or a device) may stand where a regular
+// file was seen a moment before; only a regular file is read.
 bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
-  FileDescriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC));
+  FileDescriptor file(::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
   if (!file.valid()) return Refuse(err, errno);
   struct stat status;
   if (::fstat(file.get(), &status) != 0) return Refuse(err, errno);
   if (S_ISDIR(status.st_mode)) return Refuse(err, EISDIR);
-  // One byte more than a regular file's size, so that its end is seen
-  // without growing the buffer.
-  size_t limit = S_ISREG(status.st_mode) ? static_cast<size_t>(status.st_size) + 1 : 65536;
+  if (!S_ISREG(status.st_mode)) {
+    err->reason = "Not a regular file";
+    return false;
+  }
+  // A document that could never be held is refused before any of it is read.
+  if (static_cast<uintmax_t>(status.st_size) >= MemoryLimit()) {
+    err->reason = kNotEnoughMemory;
+    return false;
+  }
+  // One byte more than the file's size, so that its end is seen without
+  // growing the buffer (it grows should the file grow meanwhile).
+  size_t limit = static_cast<size_t>(status.st_size) + 1;
   TextBuffer buffer = TextBuffer::Allocate(limit, limit / 4);
   size_t length = 0;
   for (;;) {

@@ -24,8 +24,11 @@ namespace zor2::xml {
 // encoding their XML declaration names, are converted to UTF-8 first.
 
 // Reads the document at `path` into `document`. False with `err` filled when
-// the file cannot be read (the system's reason, line and column 0) or is not
-// well-formed (the first fault, with its line and column).
+// the file cannot be read (the system's reason, line and column 0; "Not a
+// regular file" for anything else found there when it is opened, which never
+// blocks; kNotEnoughMemory for a file larger than the memory the process could
+// ever hold) or is not well-formed (the first fault, with its line and column).
+// Other allocation failures throw std::bad_alloc.
 bool ReadDocumentFile(const std::string& path, std::unique_ptr<Document>* document, ReadError* err);
 
 // Reads a document held in memory (copied first); same contract.

@@ -1,6 +1,8 @@
 #include "platform/xml/text_encoding.h"
 
 #include <iconv.h>
+#include <sys/eventfd.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <cerrno>
@@ -81,7 +83,7 @@ std::optional<Declaration> DeclaredEncoding(std::string_view text) {
 
 bool Refuse(ReadError* err, std::string reason, std::string_view text, size_t offset) {
   err->reason = std::move(reason);
-  LocateInText(text.data(), text.data() + offset, {}, &err->line, &err->column);
+  LocateInText(text.data(), text.data() + offset, &err->line, &err->column);
   return false;
 }
 
@@ -130,6 +132,34 @@ class Output {
   size_t left_;
 };
 
+// Why no conversion at all can be set up, or nothing when conversions work.
+// glibc's iconv_open answers EINVAL both for a name it does not know and when
+// it cannot load its conversion tables, as with no file descriptor left
+// (after which it keeps failing for the whole process): a descriptor taken
+// and given back, and a conversion that always exists, tell these apart.
+std::optional<std::string> ConversionsUnavailable() {
+  const int probe = ::eventfd(0, EFD_CLOEXEC);
+  if (probe < 0) return std::strerror(errno);
+  ::close(probe);
+  IconvHandle known(iconv_open("UTF-8", "UTF-16LE"));
+  if (!known.valid()) return "the system's conversion tables cannot be loaded";
+  return std::nullopt;
+}
+
+// A converter from `encoding` could not be set up; iconv_open's errno tells
+// why.
+bool SetupFailed(const std::string& encoding, std::string_view bytes, size_t name_offset,
+                 ReadError* err) {
+  const int reason = errno;
+  std::optional<std::string> unavailable =
+      reason == EINVAL ? ConversionsUnavailable() : std::strerror(reason);
+  if (!unavailable) return Refuse(err, "unknown encoding \"" + encoding + "\"", bytes, name_offset);
+  // The system's failure, not the document's: no position.
+  err->reason = "cannot convert from encoding \"" + encoding + "\": " + *unavailable;
+  err->line = err->column = 0;
+  return false;
+}
+
 bool ConversionFailed(ReadError* err, const std::string& encoding, const Output& output) {
   if (errno == EILSEQ) {
     err->reason = "byte sequence not valid in encoding \"" + encoding + "\"";
@@ -138,7 +168,7 @@ bool ConversionFailed(ReadError* err, const std::string& encoding, const Output&
   } else {
     err->reason = std::strerror(errno);
   }
-  LocateInText(output.begin(), output.end(), {}, &err->line, &err->column);
+  LocateInText(output.begin(), output.end(), &err->line, &err->column);
   return false;
 }
 
@@ -148,9 +178,7 @@ bool Transcode(const std::string& encoding, size_t unit, TextBuffer* text, size_
                size_t name_offset, ReadError* err) {
   std::string_view bytes(text->data(), text->size);
   IconvHandle converter(iconv_open("UTF-8", encoding.c_str()));
-  if (!converter.valid()) {
-    return Refuse(err, "unknown encoding \"" + encoding + "\"", bytes, name_offset);
-  }
+  if (!converter.valid()) return SetupFailed(encoding, bytes, name_offset, err);
   char* in = text->data() + skip;
   size_t in_left = text->size - skip;
   Output output(in_left / unit + in_left / (8 * unit) + 64);
@@ -204,18 +232,14 @@ bool ConvertToUtf8(TextBuffer* text, size_t* start, ReadError* err) {
   return Transcode(name, 1, text, 0, declared->offset, err);
 }
 
-void LocateInText(const char* begin, const char* position,
-                  const std::vector<size_t>& hidden_newlines, int* line, int* column) {
-  size_t offset = position - begin;
-  size_t lines = std::count(begin, position, '\n');
+void LocateInText(const char* begin, const char* position, int* line, int* column) {
+  size_t lines = 0;
   const char* line_start = begin;
-  if (const void* newline = memrchr(begin, '\n', offset)) {
-    line_start = static_cast<const char*>(newline) + 1;
-  }
-  auto hidden_end = std::lower_bound(hidden_newlines.begin(), hidden_newlines.end(), offset);
-  lines += hidden_end - hidden_newlines.begin();
-  if (hidden_end != hidden_newlines.begin()) {
-    line_start = std::max(line_start, begin + *(hidden_end - 1) + 1);
+  for (const char* p = begin; p < position; ++p) {
+    if (*p != '\n' && *p != '\r') continue;
+    if (*p == '\r' && p + 1 < position && p[1] == '\n') ++p;
+    ++lines;
+    line_start = p + 1;
   }
   // A character is counted at its first byte: UTF-8 continuation bytes are
   // 10xxxxxx.

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cstddef>
-#include <vector>
 
 #include "platform/xml/document_storage.h"
 #include "platform/xml/read_error.h"
@@ -16,13 +15,13 @@ namespace zor2::xml {
 // byte-order mark, and documents whose XML declaration names an encoding other
 // than UTF-8 (or ASCII), are converted into a new buffer that replaces `*text`.
 // Returns false with `err` filled when iconv does not know the declared
-// encoding or the bytes are not valid in it.
+// encoding, the system cannot set up the conversion (no position then), or the
+// bytes are not valid in it.
 bool ConvertToUtf8(TextBuffer* text, size_t* start, ReadError* err);
 
 // Sets the 1-based line and column, counted in characters, of `position` in
-// the UTF-8 text that starts at `begin`. `hidden_newlines` holds, in increasing
-// order, the offsets of line feeds that were overwritten in the text.
-void LocateInText(const char* begin, const char* position,
-                  const std::vector<size_t>& hidden_newlines, int* line, int* column);
+// the UTF-8 text that starts at `begin`. A lone carriage return, a carriage
+// return and line feed, and a lone line feed each end one line.
+void LocateInText(const char* begin, const char* position, int* line, int* column);
 
 }  // namespace zor2::xml

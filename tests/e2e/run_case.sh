@@ -12,13 +12,22 @@
 #   expected.files/NAME  when present, each compared with the file NAME that the
 #                        run wrote (exports, for example)
 #   setup.sh           when present, run (with bash) in the working copy first
+#   run.sh             when present, run (with bash) instead of the program, with
+#                      the program's command line as its arguments ("$@" runs
+#                      it): for a case that needs a signal, a pipe, a limit or
+#                      a mount around the run; its output and status are the
+#                      case's
+#   check.sh           when present, run (with bash) after the program; a
+#                      non-zero status fails the case (files left behind or
+#                      kept intact)
 #   run_as             when present, a user name: run as root, the program runs
 #                      as that user, since file modes do not bind root
 #
 # The case runs in a fresh copy of its folder, with the program named
 # "zor2check" whatever its path, and every expected file must match byte for
 # byte. A case that cannot be arranged on this machine says so and exits
-# with 77 (skipped).
+# with 77 (skipped), from setup.sh or run.sh as well. The hooks find the
+# program's path in ZOR2CHECK.
 set -u
 bin=$1
 case_dir=$2
@@ -28,7 +37,13 @@ trap 'chmod -R u+rwX "$work" 2>/dev/null; rm -rf "$work"' EXIT
 # Links are followed, so that cases can share one expected file (the help page).
 cp -RL "$case_dir/." "$work/"
 cd "$work" || exit 1
-[ -f setup.sh ] && { bash setup.sh || { echo "setup.sh failed"; exit 1; }; }
+export ZOR2CHECK=$bin
+if [ -f setup.sh ]; then
+  bash setup.sh
+  setup_status=$?
+  [ "$setup_status" -eq 77 ] && exit 77
+  [ "$setup_status" -ne 0 ] && { echo "setup.sh failed"; exit 1; }
+fi
 
 # As another user, the program runs from a copy in the working folder, which
 # that user can reach and write whatever the build directory's modes.
@@ -46,9 +61,14 @@ fi
 
 args=()
 [ -f args ] && mapfile -t args < args
-("${as_user[@]}" bash -c 'exec -a zor2check "$0" "$@"' "$bin" "${args[@]}") \
-  > actual.stdout 2> actual.stderr < /dev/null
+command=("${as_user[@]}" bash -c 'exec -a zor2check "$0" "$@"' "$bin" "${args[@]}")
+[ -f run.sh ] && command=(bash run.sh "${command[@]}")
+("${command[@]}") > actual.stdout 2> actual.stderr < /dev/null
 status=$?
+if [ -f run.sh ] && [ "$status" -eq 77 ]; then
+  cat actual.stdout
+  exit 77
+fi
 
 failed=0
 expect() {  # expect <expected file> <actual file>
@@ -77,5 +97,9 @@ expect expected.stderr actual.stderr
 [ -f expected.help.htm ] && expect expected.help.htm help.htm
 if [ -d expected.files ]; then
   for expected_file in expected.files/*; do expect "$expected_file" "${expected_file#expected.files/}"; done
+fi
+if [ -f check.sh ] && ! bash check.sh; then
+  echo "--- check.sh failed"
+  failed=1
 fi
 exit $failed

@@ -129,7 +129,7 @@ bool WriteRun(const std::string& directory, const std::string& name, const Run& 
   for (const auto& e : exports) {
     const std::string path = directory + "/" + name + e.extension;
     std::string err;
-    if (!zor2::WriteFileAtomically(path, e.text, &err)) {
+    if (!zor2::WriteFileAtomically(path, e.text, nullptr, &err)) {
       std::fprintf(stderr, "export_example: %s: %s\n", path.c_str(), err.c_str());
       return false;
     }

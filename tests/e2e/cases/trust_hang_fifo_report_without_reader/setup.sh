@@ -1,0 +1,1 @@
+mkfifo out.xml

@@ -1,0 +1,2 @@
+ln -s chk.xml link.htm
+cp chk.xml chk.before

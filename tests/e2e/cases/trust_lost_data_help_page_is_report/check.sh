@@ -1,0 +1,2 @@
+# Nothing is written.
+[ ! -e same.xml ]

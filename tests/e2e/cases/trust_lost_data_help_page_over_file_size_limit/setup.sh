@@ -1,0 +1,1 @@
+echo "old page" > help.htm

@@ -1,0 +1,1 @@
+cp chk/Geometry.xml Geometry.before

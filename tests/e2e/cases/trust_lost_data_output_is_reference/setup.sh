@@ -1,0 +1,1 @@
+cp ref.xml ref.before
