@@ -27,7 +27,8 @@
 # "zor2check" whatever its path, and every expected file must match byte for
 # byte. A case that cannot be arranged on this machine says so and exits
 # with 77 (skipped), from setup.sh or run.sh as well. The hooks find the
-# program's path in ZOR2CHECK.
+# program's path in ZOR2CHECK, and this folder's (which holds interpose.c, the
+# library some cases preload) in E2E_DIR.
 set -u
 bin=$1
 case_dir=$2
@@ -38,6 +39,8 @@ trap 'chmod -R u+rwX "$work" 2>/dev/null; rm -rf "$work"' EXIT
 cp -RL "$case_dir/." "$work/"
 cd "$work" || exit 1
 export ZOR2CHECK=$bin
+E2E_DIR=$(cd "$(dirname "$0")" && pwd)
+export E2E_DIR
 if [ -f setup.sh ]; then
   bash setup.sh
   setup_status=$?

@@ -1,1 +1,0 @@
-../../interpose.c
