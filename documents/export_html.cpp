@@ -161,11 +161,14 @@ class Page {
   std::string* out_;
 };
 
-// The help texts as plain text, in the table's order, made once.
-const std::array<std::string, kMessageTypes.size()>& HelpTexts() {
+// The help texts as plain text, escaped for the page, in the table's order:
+// made once, since every finding shows the text of its type.
+const std::array<std::string, kMessageTypes.size()>& EscapedHelpTexts() {
   static const auto texts = [] {
     std::array<std::string, kMessageTypes.size()> help;
-    for (size_t i = 0; i < help.size(); ++i) help[i] = HelpAsText(kMessageTypes[i].help);
+    for (size_t i = 0; i < help.size(); ++i) {
+      AppendHtmlEscaped(HelpAsText(kMessageTypes[i].help), &help[i]);
+    }
     return help;
   }();
   return texts;
@@ -219,8 +222,8 @@ void WriteFinding(Page& page, const Finding& finding, size_t index) {
     }
     page << "</p>\n";
   }
-  page << "<p class=\"help\">";
-  page.Text(HelpTexts()[static_cast<size_t>(finding.code)]) << "</p>\n</article>\n";
+  page << "<p class=\"help\">" << EscapedHelpTexts()[static_cast<size_t>(finding.code)]
+       << "</p>\n</article>\n";
 }
 
 // The findings of one file: those on the file itself first, then one section

@@ -128,4 +128,9 @@ bool MayNormalizeTypeNames(std::string_view value) {
          value.find("QEXDOUBLE128") != std::string_view::npos;
 }
 
+bool MayHoldNormalizedTypeNames(std::string_view value) {
+  return value.find("QEX") != std::string_view::npos ||
+         value.find("long") != std::string_view::npos;
+}
+
 }  // namespace zor2

@@ -21,4 +21,8 @@ bool NormalizeTypeNames(std::string_view value, std::string* rewritten);
 // holds neither "long" nor "QEXDOUBLE128".
 bool MayNormalizeTypeNames(std::string_view value);
 
+// False for a value that NormalizeTypeNames surely did not make: one that holds
+// neither a portable name ("QEX...") nor "long".
+bool MayHoldNormalizedTypeNames(std::string_view value);
+
 }  // namespace zor2

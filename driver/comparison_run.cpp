@@ -222,27 +222,30 @@ class ComparisonRun {
     summary_.failed = summary_.not_accepted > 0;
   }
 
-  // Each export is made on a thread of its own while the report is written;
-  // they only read the findings, which no longer change. The files are
-  // written afterwards, one at a time, as every output is.
+  // Each export is made and written on a thread of its own while the report
+  // is written; they only read the findings, which no longer change. Each
+  // task answers why its export could not be written, or nothing.
   std::vector<std::future<std::string>> StartExports() {
     std::vector<std::future<std::string>> exports;
     if (config_.export_paths.empty()) return exports;
     run_ = RunDescription{kToolVersion, config_.reference_path, config_.checked_path,
                           config_.output_path, config_.items};
     for (const std::string& path : config_.export_paths) {
-      exports.push_back(RunInBackground(
-          [this, &path] { return ExportText(*ExportFormatOf(path), run_, summary_, findings_); }));
+      exports.push_back(RunInBackground([this, &path] {
+        std::string err;
+        const std::string text = ExportText(*ExportFormatOf(path), run_, summary_, findings_);
+        return WriteFileAtomically(path, text, nullptr, &err) ? std::string() : err;
+      }));
     }
     return exports;
   }
 
-  // Writes the exports, in the order they were asked for.
+  // Names the exports that could not be written, in the order they were asked
+  // for.
   void FinishExports(std::vector<std::future<std::string>>& exports) {
     for (size_t i = 0; i < exports.size(); ++i) {
-      const std::string& path = config_.export_paths[i];
-      std::string err;
-      if (!WriteFileAtomically(path, exports[i].get(), nullptr, &err)) ReportFailure(path, err);
+      const std::string err = exports[i].get();
+      if (!err.empty()) ReportFailure(config_.export_paths[i], err);
     }
   }
 

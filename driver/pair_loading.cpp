@@ -16,7 +16,8 @@ namespace {
 // Touches nothing but its own document, so that loads can run at once. A
 // document that does not fit in memory is a fault of its pair only.
 LoadedDocument LoadDocument(const std::string& path, bool keep_originals) {
-  LoadedDocument loaded{path, nullptr, {}, xml::OriginalValues(MayNormalizeTypeNames)};
+  LoadedDocument loaded{
+      path, nullptr, {}, xml::OriginalValues(MayNormalizeTypeNames, MayHoldNormalizedTypeNames)};
   try {
     if (xml::ReadDocumentFile(path, &loaded.document, &loaded.error)) {
       loaded.document->RewriteValues(PrepareValue, keep_originals ? &loaded.originals : nullptr);

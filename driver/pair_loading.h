@@ -27,7 +27,7 @@ struct LoadedDocument {
   xml::ReadError error;                     // why, when document is null
   // When asked for, the text of the values whose type names preparation
   // respelled; the others read as the document wrote them.
-  xml::OriginalValues originals{MayNormalizeTypeNames};
+  xml::OriginalValues originals{MayNormalizeTypeNames, MayHoldNormalizedTypeNames};
 };
 
 // The two documents of a pair.

@@ -4,24 +4,56 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <array>
 #include <atomic>
 #include <cerrno>
 #include <csignal>
 #include <cstring>
 #include <random>
+#include <thread>
 
 #include "platform/tools/file_descriptor.h"
 
 namespace zor2 {
 namespace {
 
-// The temporary file being written, for the signal handler: outputs are
-// written one at a time.
-std::atomic<const char*> temporary_in_progress{nullptr};
+// The temporary files being written, for the signal handler. A writer holds a
+// slot from before its temporary file exists until the file is renamed or
+// removed; a few outputs are written at once (the report and the exports), and
+// a writer that finds every slot taken waits for one.
+constexpr size_t kWritersAtOnce = 4;
+std::array<std::atomic<const char*>, kWritersAtOnce> temporaries_in_progress{};
+std::array<std::atomic<bool>, kWritersAtOnce> slots_taken{};
 static_assert(std::atomic<const char*>::is_always_lock_free, "read by a signal handler");
 
+// One writer's slot, given back when it goes.
+class TemporarySlot {
+ public:
+  TemporarySlot() {
+    for (;;) {
+      for (index_ = 0; index_ < kWritersAtOnce; ++index_) {
+        if (!slots_taken[index_].exchange(true)) return;
+      }
+      std::this_thread::yield();
+    }
+  }
+  TemporarySlot(const TemporarySlot&) = delete;
+  TemporarySlot& operator=(const TemporarySlot&) = delete;
+  ~TemporarySlot() {
+    Publish(nullptr);
+    slots_taken[index_].store(false);
+  }
+  // REQUIRES: `path` stays valid until the next Publish.
+  void Publish(const char* path) { temporaries_in_progress[index_].store(path); }
+
+ private:
+  size_t index_;
+};
+
 extern "C" void EndInterruptedRun(int signal_number) {
-  if (const char* temporary = temporary_in_progress.load()) ::unlink(temporary);
+  for (const std::atomic<const char*>& slot : temporaries_in_progress) {
+    if (const char* temporary = slot.load()) ::unlink(temporary);
+  }
   // The handler was reset on entry: ending by the signal itself tells the
   // parent how the run ended (a shell shows 128 and its number).
   ::raise(signal_number);
@@ -80,7 +112,8 @@ bool FinalTarget(const std::string& path, std::string* target) {
 // umask); sets `temporary` to its name. The name is short and hidden,
 // ".zor2check." and six random letters, so that it fits wherever `path`'s
 // name fits and stays out of listings.
-FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string* temporary) {
+FileDescriptor CreateTemporary(const std::string& path, mode_t mode, TemporarySlot& slot,
+                               std::string* temporary) {
   static constexpr char kLetters[] =
       "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789";
   const std::string directory = DirectoryOf(path);
@@ -90,13 +123,13 @@ FileDescriptor CreateTemporary(const std::string& path, mode_t mode, std::string
     std::string name = directory + ".zor2check.";
     for (int i = 0; i < 6; ++i) name += kLetters[random() % (sizeof kLetters - 1)];
     // Published before it exists, so that no signal can leave it behind.
-    temporary_in_progress.store(nullptr);
+    slot.Publish(nullptr);
     *temporary = std::move(name);
-    temporary_in_progress.store(temporary->c_str());
+    slot.Publish(temporary->c_str());
     FileDescriptor file(
         ::open(temporary->c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOCTTY | O_CLOEXEC, mode));
     if (file.valid()) return file;
-    temporary_in_progress.store(nullptr);
+    slot.Publish(nullptr);
     if (errno != EEXIST) return file;
   }
   errno = EEXIST;
@@ -126,8 +159,9 @@ bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* 
     return WriteFileInPlace(path, bytes, opened, err);
   }
 
+  TemporarySlot slot;
   std::string temporary;
-  FileDescriptor file = CreateTemporary(target, 0644, &temporary);
+  FileDescriptor file = CreateTemporary(target, 0644, slot, &temporary);
   *opened = file.valid();
   if (!file.valid()) return Fail(err, errno);
   // A replaced file keeps its mode; the mode is a courtesy, so a file system
@@ -138,7 +172,7 @@ bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* 
   if (!file.Close() && error == 0) error = errno;
   if (error == 0 && ::rename(temporary.c_str(), target.c_str()) != 0) error = errno;
   if (error != 0) ::unlink(temporary.c_str());
-  temporary_in_progress.store(nullptr);
+  slot.Publish(nullptr);
   return error == 0 || Fail(err, error);
 }
 

@@ -16,7 +16,7 @@ namespace zor2 {
 // a pipe) is written in place (WriteFileInPlace). False with the system's
 // reason in `err` when any step fails; the temporary file is then removed.
 // `opened`, when given, tells whether the file (or the temporary one) could be
-// opened at all. Outputs are written one at a time.
+// opened at all. Several outputs may be written at once, from several threads.
 bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,
                          std::string* err);
 

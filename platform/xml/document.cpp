@@ -106,6 +106,7 @@ void OriginalValues::Clear() {
 }
 
 std::optional<std::string_view> OriginalValues::Find(const char* value) const {
+  if (may_be_kept_ != nullptr && !may_be_kept_(value)) return std::nullopt;
   for (const std::deque<Entry>* run : {&in_place_, &moved_}) {
     auto entry = std::lower_bound(
         run->begin(), run->end(), value,

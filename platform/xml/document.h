@@ -59,10 +59,14 @@ using ValueRewrite = bool (*)(std::string_view value, std::string* rewritten);
 // costs one allocation for all values rather than one per value.
 class OriginalValues {
  public:
+  using Test = bool (*)(std::string_view text);
+
   // Keeps the original of a changed value only when `worth_keeping` holds for
-  // it (of every changed value without it).
-  explicit OriginalValues(bool (*worth_keeping)(std::string_view original) = nullptr)
-      : worth_keeping_(worth_keeping) {}
+  // it (of every changed value without it); `may_be_kept`, when given, tells
+  // from a rewritten value whether its original may have been kept, so that
+  // most lookups need no search.
+  explicit OriginalValues(Test worth_keeping = nullptr, Test may_be_kept = nullptr)
+      : worth_keeping_(worth_keeping), may_be_kept_(may_be_kept) {}
 
   // The text `value` had before the rewrite, if the rewrite changed it and it
   // was worth keeping.
@@ -82,7 +86,8 @@ class OriginalValues {
   void Seal();
   void Clear();
 
-  bool (*worth_keeping_)(std::string_view original);
+  Test worth_keeping_;
+  Test may_be_kept_;
   std::deque<Entry> in_place_;
   std::deque<Entry> moved_;
   // The original texts, in chunks that never move: no copying as they grow.
