@@ -156,7 +156,8 @@ class ComparisonRun {
     ReportLoadFault(pair.checked);
     if (pair.reference.document && pair.checked.document) {
       ++summary_.pairs_compared;
-      FindingCollector collector(&pair.reference.originals, &pair.checked.originals);
+      FindingCollector collector(&pair.reference.originals, &pair.checked.originals,
+                                 config_.baseline_path.has_value());
       CompareFrameworks(pair.reference.document->root(), pair.checked.document->root(),
                         config_.settings, report_, log_, collecting_ ? &collector : nullptr);
       // The findings hold copies of the values they show, never pointers into

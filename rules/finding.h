@@ -22,7 +22,8 @@ struct Finding {
   std::string reason;
   xml::OutputElement* report_error = nullptr;  // the finding's "Error" in the report
   // Where the finding's "Error" stands in the report, as ReportStep writes
-  // each element of its chain, followed by its ID: what a baseline matches.
+  // each element of its chain, followed by its ID: what a baseline matches
+  // (filled only for a run with a baseline).
   std::string report_path;
 };
 
@@ -38,22 +39,27 @@ std::string ReportStep(std::string_view tag, const char* name, const char* signa
 class FindingCollector {
  public:
   // `reference` and `checked` hold the original text of the values that
-  // preparation changed in each document (either may be null).
-  FindingCollector(const xml::OriginalValues* reference, const xml::OriginalValues* checked)
-      : reference_(reference), checked_(checked) {}
+  // preparation changed in each document (either may be null); with
+  // `report_paths`, each finding also gets its report path, which only a
+  // baseline needs.
+  FindingCollector(const xml::OriginalValues* reference, const xml::OriginalValues* checked,
+                   bool report_paths)
+      : reference_(reference), checked_(checked), report_paths_(report_paths) {}
 
   // The text of a document value as the document wrote it (entity references
   // decoded, type names as spelled); empty for a null value.
   std::string AsWritten(const char* value) const;
 
   std::vector<Finding>& findings() { return findings_; }
+  bool report_paths() const { return report_paths_; }
 
   // A collector for part of the same comparison, with the same documents.
-  FindingCollector Part() const { return FindingCollector(reference_, checked_); }
+  FindingCollector Part() const { return FindingCollector(reference_, checked_, report_paths_); }
 
  private:
   const xml::OriginalValues* reference_;
   const xml::OriginalValues* checked_;
+  bool report_paths_;
   std::vector<Finding> findings_;
 };
 

@@ -59,8 +59,9 @@ void ReportMirror::Locate(Finding* finding) const {
       finding->method = name;
       finding->signature = shown->AsWritten(mirror->signature_);
     }
-    steps.push_back(ReportStep(tag, mirror->name_, mirror->signature_));
+    if (shown->report_paths()) steps.push_back(ReportStep(tag, mirror->name_, mirror->signature_));
   }
+  if (!shown->report_paths()) return;
   for (auto step = steps.rbegin(); step != steps.rend(); ++step) finding->report_path += *step;
   finding->report_path += MessageTypeOf(finding->code).id;
 }
