@@ -14,6 +14,7 @@
 # library through a link), with each program named as in the steps whatever its path, and every
 # expected file must match byte for byte.
 set -u
+tests_dir=$(cd "$(dirname "$0")/.." && pwd)
 describe_bin=$(realpath "$1")
 check_bin=$(realpath "$2")
 case_dir=$3
@@ -42,18 +43,8 @@ while read -r program arguments; do
   echo $? >>actual.status
 done <steps
 
-failed=0
-expect() { # expect <expected file> <actual file>
-  local expected=$1 actual=$2
-  if [ ! -e "$actual" ]; then
-    echo "--- $actual was not written"
-    failed=1
-  elif ! cmp -s "$expected" "$actual"; then
-    echo "--- $actual differs from $expected:"
-    diff -u "$expected" "$actual" | head -n 80
-    failed=1
-  fi
-}
+# shellcheck source=tests/expect.sh
+source "$tests_dir/expect.sh"
 
 [ -f expected.status ] || sed 's/.*/0/' actual.status >expected.status
 [ -f expected.stdout ] || : >expected.stdout

@@ -32,6 +32,9 @@
 set -u
 bin=$1
 case_dir=$2
+E2E_DIR=$(cd "$(dirname "$0")" && pwd)
+tests_dir=$(dirname "$E2E_DIR")
+export E2E_DIR
 
 work=$(mktemp -d)
 trap 'chmod -R u+rwX "$work" 2>/dev/null; rm -rf "$work"' EXIT
@@ -39,8 +42,6 @@ trap 'chmod -R u+rwX "$work" 2>/dev/null; rm -rf "$work"' EXIT
 cp -RL "$case_dir/." "$work/"
 cd "$work" || exit 1
 export ZOR2CHECK=$bin
-E2E_DIR=$(cd "$(dirname "$0")" && pwd)
-export E2E_DIR
 if [ -f setup.sh ]; then
   bash setup.sh
   setup_status=$?
@@ -73,18 +74,8 @@ if [ -f run.sh ] && [ "$status" -eq 77 ]; then
   exit 77
 fi
 
-failed=0
-expect() {  # expect <expected file> <actual file>
-  local expected=$1 actual=$2
-  if [ ! -e "$actual" ]; then
-    echo "--- $actual was not written"
-    failed=1
-  elif ! cmp -s "$expected" "$actual"; then
-    echo "--- $actual differs from $expected:"
-    diff -u "$expected" "$actual" | head -n 60
-    failed=1
-  fi
-}
+# shellcheck source=tests/expect.sh
+source "$tests_dir/expect.sh"
 
 want_status=0
 [ -f expected.status ] && want_status=$(cat expected.status)

@@ -1,16 +1,2 @@
-# The run is held at the rename of its report and sent SIGTERM. A background
-# command ignores SIGINT unless told otherwise; a sanitizer runtime accepts a
-# library preloaded before it.
-(
-  trap - INT
-  export ZOR2_TEST_STOP_AT_RENAME=renaming LD_PRELOAD=$PWD/interpose.so \
-    ASAN_OPTIONS=verify_asan_link_order=0
-  exec "$@"
-) &
-run=$!
-for _ in $(seq 400); do
-  [ -d renaming ] && break
-  sleep 0.05
-done
-kill -TERM $run
-wait $run
+# The run is held at the rename of its report and sent SIGTERM.
+bash "$E2E_DIR/interrupt_at_rename.sh" TERM "$@"
