@@ -1,6 +1,7 @@
 // Thread model. The main thread runs the whole program and is the only one
 // that writes the report, the help page and the standard log. Other threads
-// only ever read documents and fill what they were handed:
+// only ever read what no thread changes any more and fill what they were
+// handed:
 // - pair loading (PairReader, LoadPair) reads and prepares the two documents
 //   of a pair on two threads, and in directory mode the next small pairs while
 //   the current one is compared; each load owns the document it makes;
@@ -8,7 +9,9 @@
 //   the main thread and one helper, each pair into a report branch and a log
 //   of its own, which the main thread appends to the report and replays into
 //   the standard log in reference order;
-// - the documents of a compared pair are freed on a thread of their own.
+// - the documents of a compared pair are freed on a thread of their own;
+// - once every finding is final, each export is made and written on a thread
+//   of its own, while the main thread writes the report.
 // So the report and every log line are the same, byte for byte, as a
 // single-threaded run's. Should a thread not start, its work runs on the main
 // thread instead.
