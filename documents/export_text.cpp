@@ -3,41 +3,13 @@
 #include <unordered_map>
 #include <utility>
 
+#include "platform/xml/xml_characters.h"
+
 namespace zor2 {
 
 namespace {
 
 constexpr std::string_view kReplacementCharacter = "\xEF\xBF\xBD";
-
-// The length of the UTF-8 sequence that starts at `text[i]`, or 0 when the
-// bytes there are not one.
-size_t Utf8SequenceLength(std::string_view text, size_t i) {
-  const auto lead = static_cast<unsigned char>(text[i]);
-  if (lead < 0x80) return 1;
-  size_t length = 0;
-  unsigned char low = 0x80;
-  unsigned char high = 0xBF;
-  if (lead >= 0xC2 && lead <= 0xDF) {
-    length = 2;
-  } else if (lead >= 0xE0 && lead <= 0xEF) {
-    length = 3;
-    if (lead == 0xE0) low = 0xA0;   // overlong
-    if (lead == 0xED) high = 0x9F;  // surrogates
-  } else if (lead >= 0xF0 && lead <= 0xF4) {
-    length = 4;
-    if (lead == 0xF0) low = 0x90;   // overlong
-    if (lead == 0xF4) high = 0x8F;  // beyond U+10FFFF
-  } else {
-    return 0;
-  }
-  if (i + length > text.size()) return 0;
-  const auto second = static_cast<unsigned char>(text[i + 1]);
-  if (second < low || second > high) return 0;
-  for (size_t k = 2; k < length; ++k) {
-    if ((static_cast<unsigned char>(text[i + k]) & 0xC0) != 0x80) return 0;
-  }
-  return length;
-}
 
 // Appends `text` to `out`: runs of ASCII characters for which `special` is
 // false as they are, each ASCII character for which it is true through
@@ -47,6 +19,7 @@ size_t Utf8SequenceLength(std::string_view text, size_t i) {
 template <typename Special, typename Escape>
 void AppendEscapedUtf8(std::string_view text, std::string* out, Special special, Escape escape) {
   size_t run = 0;
+  char32_t code_point;
   for (size_t i = 0; i < text.size();) {
     const auto byte = static_cast<unsigned char>(text[i]);
     if (byte < 0x80 && !special(text[i])) {
@@ -57,7 +30,7 @@ void AppendEscapedUtf8(std::string_view text, std::string* out, Special special,
     if (byte < 0x80) {
       escape(text[i]);
       ++i;
-    } else if (const size_t length = Utf8SequenceLength(text, i); length == 0) {
+    } else if (const size_t length = xml::DecodeUtf8(text.substr(i), &code_point); length == 0) {
       out->append(kReplacementCharacter);
       ++i;
     } else {

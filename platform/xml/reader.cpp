@@ -368,7 +368,7 @@ char* Parser::ScanName(char* p) {
 // Moves `p` past the non-ASCII character there, or fails.
 bool Parser::SkipNonAscii(char*& p) {
   char32_t code_point;
-  const size_t length = DecodeUtf8(p, &code_point);
+  const size_t length = DecodeUtf8(std::string_view(p, end_ - p), &code_point);
   if (length == 0) return Fail(p, "invalid UTF-8 byte sequence");
   if (!IsXmlCharacter(code_point)) {
     return Fail(p, "character " + CodePointName(code_point) + " is not allowed in XML");

@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <string>
+#include <string_view>
 
 namespace zor2::xml {
 
@@ -13,13 +14,13 @@ constexpr bool IsXmlCharacter(char32_t code_point) {
          (code_point >= 0x10000 && code_point <= 0x10FFFF);
 }
 
-// Decodes the UTF-8 sequence at `text` into `code_point` and returns its
-// length, or returns 0 when the bytes there are not well-formed UTF-8 (a
-// stray continuation byte, an overlong form, a surrogate, a code point beyond
-// U+10FFFF, a sequence cut short). Stops at the first byte that does not fit,
-// so a zero-terminated text is never read past its end.
-inline size_t DecodeUtf8(const char* text, char32_t* code_point) {
-  const auto* p = reinterpret_cast<const unsigned char*>(text);
+// Decodes the UTF-8 sequence at the start of `text` into `code_point` and
+// returns its length, or returns 0 when the bytes there are not well-formed
+// UTF-8 (a stray continuation byte, an overlong form, a surrogate, a code
+// point beyond U+10FFFF, a sequence cut short by a byte or by the end).
+// REQUIRES: `text` is not empty.
+inline size_t DecodeUtf8(std::string_view text, char32_t* code_point) {
+  const auto* p = reinterpret_cast<const unsigned char*>(text.data());
   const unsigned char lead = p[0];
   if (lead < 0x80) {
     *code_point = lead;
@@ -47,6 +48,7 @@ inline size_t DecodeUtf8(const char* text, char32_t* code_point) {
   } else {
     return 0;
   }
+  if (length > text.size()) return 0;
   for (size_t i = 1; i < length; ++i) {
     if (p[i] < low || p[i] > high) return 0;
     low = 0x80;

@@ -40,7 +40,7 @@ TEST(DecodeUtf8Test, AcceptsWellFormedSequencesOnly) {
   };
   for (const Row& row : rows) {
     char32_t code_point = 0;
-    EXPECT_EQ(DecodeUtf8(row.bytes.c_str(), &code_point), row.length) << row.bytes;
+    EXPECT_EQ(DecodeUtf8(row.bytes, &code_point), row.length) << row.bytes;
     if (row.length != 0) {
       EXPECT_EQ(code_point, row.code_point) << row.bytes;
     }
