@@ -50,6 +50,12 @@ class TemporarySlot {
   size_t index_;
 };
 
+// What the names of temporary files start with.
+std::string& TemporaryPrefix() {
+  static std::string prefix = ".zor2check.";
+  return prefix;
+}
+
 extern "C" void EndInterruptedRun(int signal_number) {
   for (const std::atomic<const char*>& slot : temporaries_in_progress) {
     if (const char* temporary = slot.load()) ::unlink(temporary);
@@ -110,8 +116,8 @@ bool FinalTarget(const std::string& path, std::string* target) {
 
 // Creates a new file in the directory of `path`, with `mode` (less the
 // umask); sets `temporary` to its name. The name is short and hidden,
-// ".zor2check." and six random letters, so that it fits wherever `path`'s
-// name fits and stays out of listings.
+// ".zor2check." (or the program's own name) and six random letters, so that it fits wherever
+// `path`'s name fits and stays out of listings.
 FileDescriptor CreateTemporary(const std::string& path, mode_t mode, TemporarySlot& slot,
                                std::string* temporary) {
   static constexpr char kLetters[] =
@@ -120,7 +126,7 @@ FileDescriptor CreateTemporary(const std::string& path, mode_t mode, TemporarySl
   std::random_device seed;
   std::minstd_rand random(seed());
   for (int attempt = 0; attempt < 100; ++attempt) {
-    std::string name = directory + ".zor2check.";
+    std::string name = directory + TemporaryPrefix();
     for (int i = 0; i < 6; ++i) name += kLetters[random() % (sizeof kLetters - 1)];
     // Published before it exists, so that no signal can leave it behind.
     slot.Publish(nullptr);
@@ -137,6 +143,12 @@ FileDescriptor CreateTemporary(const std::string& path, mode_t mode, TemporarySl
 }
 
 }  // namespace
+
+void NameTemporaryFilesAfter(std::string_view program) {
+  std::string prefix(".");
+  prefix.append(program).append(".");
+  TemporaryPrefix() = std::move(prefix);
+}
 
 bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,
                          std::string* err) {

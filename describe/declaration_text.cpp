@@ -1,0 +1,242 @@
+#include "describe/declaration_text.h"
+
+#include <algorithm>
+#include <string_view>
+
+#include "describe/clang_handles.h"
+#include "describe/token_text.h"
+#include "describe/type_spelling.h"
+
+namespace zor2::describe {
+namespace {
+
+bool IsTemplateParameterKind(CXCursorKind kind) {
+  return kind == CXCursor_TemplateTypeParameter || kind == CXCursor_NonTypeTemplateParameter ||
+         kind == CXCursor_TemplateTemplateParameter;
+}
+
+// Where the code at `location` is written in a file: for a macro's argument,
+// where the argument is written; for a macro's body, where the macro is used.
+void FileLocation(CXSourceLocation location, CXFile* file, unsigned* offset) {
+  clang_getFileLocation(location, file, nullptr, nullptr, offset);
+}
+
+// Where a macro that produces the code at `location` is used.
+void ExpansionLocation(CXSourceLocation location, CXFile* file, unsigned* offset) {
+  clang_getExpansionLocation(location, file, nullptr, nullptr, offset);
+}
+
+// One template parameter as the head shows it. Template template parameters
+// nest as deep as the source does; past a few levels the inner heads are
+// abbreviated, so that no declaration makes this recurse without bound.
+std::string TemplateParameterText(CXTranslationUnit unit, CXCursor parameter, int nesting) {
+  const CXCursorKind kind = clang_getCursorKind(parameter);
+  const std::string name = Take(clang_getCursorSpelling(parameter));
+  const std::string pack = IsTemplateParameterPack(parameter) ? "..." : "";
+  std::string text;
+  if (kind == CXCursor_TemplateTypeParameter) {
+    text = "typename" + pack;
+  } else if (kind == CXCursor_NonTypeTemplateParameter) {
+    text = Take(clang_getTypeSpelling(clang_getCursorType(parameter))) + pack;
+  } else {
+    std::string inner;
+    if (nesting < 4) {
+      for (CXCursor child : ChildrenOf(parameter)) {
+        if (!IsTemplateParameterKind(clang_getCursorKind(child))) continue;
+        if (!inner.empty()) inner += ", ";
+        inner += TemplateParameterText(unit, child, nesting + 1);
+      }
+    } else {
+      inner = "...";
+    }
+    text = "template <" + inner + "> class" + pack;
+  }
+  return name.empty() ? text : text + " " + name;
+}
+
+// Whether `text` is a null pointer constant as the compiler prints it.
+bool IsNullPointerText(std::string_view text) {
+  static constexpr std::string_view kNulls[] = {
+      "nullptr", "0",    "0L",     "0U",         "0UL",         "0LL",
+      "0ULL",    "NULL", "__null", "(void *)0",  "((void *)0)", "std::nullptr_t()",
+      "{}",      "0l",   "0ul",    "nullptr_t()"};
+  for (std::string_view null : kNulls) {
+    if (text == null) return true;
+  }
+  return false;
+}
+
+bool IsPointerLike(CXType type) {
+  const CXTypeKind kind = clang_getCanonicalType(type).kind;
+  return kind == CXType_Pointer || kind == CXType_MemberPointer || kind == CXType_NullPtr ||
+         kind == CXType_BlockPointer;
+}
+
+// The default argument as the compiler prints the parameter ("int x = 3"):
+// what follows the first " = " outside literals, or nothing.
+std::optional<std::string> PrintedDefault(CXCursor parameter) {
+  CXPrintingPolicy policy = clang_getCursorPrintingPolicy(parameter);
+  const std::string printed = Take(clang_getCursorPrettyPrinted(parameter, policy));
+  clang_PrintingPolicy_dispose(policy);
+  char quote = 0;
+  for (size_t i = 0; i + 3 <= printed.size(); ++i) {
+    const char c = printed[i];
+    if (quote != 0) {
+      if (c == '\\') {
+        ++i;
+      } else if (c == quote) {
+        quote = 0;
+      }
+      continue;
+    }
+    if (c == '"' || c == '\'') {
+      quote = c;
+    } else if (printed.compare(i, 3, " = ") == 0) {
+      return printed.substr(i + 3);
+    }
+  }
+  return std::nullopt;
+}
+
+// The default argument's tokens from `begin` (an offset in `file`): every token
+// up to `end`, and past it as long as a bracket opened inside is still open
+// (the closing parenthesis of a macro call whose argument ends the expression),
+// stopping at a comma or a closing bracket of the parameter list.
+std::string DefaultTokens(CXTranslationUnit unit, CXFile file, unsigned begin, unsigned end,
+                          CXCursor function) {
+  CXFile function_end_file = nullptr;
+  unsigned function_end = 0;
+  ExpansionLocation(clang_getRangeEnd(clang_getCursorExtent(function)), &function_end_file,
+                    &function_end);
+  if (function_end_file != file || function_end < end) function_end = end;
+  size_t file_size = 0;
+  clang_getFileContents(unit, file, &file_size);
+  const unsigned last = std::min<unsigned>(function_end + 1, static_cast<unsigned>(file_size));
+  const CXSourceRange range = clang_getRange(clang_getLocationForOffset(unit, file, begin),
+                                             clang_getLocationForOffset(unit, file, last));
+  const Tokens tokens(unit, range);
+  std::vector<std::string> kept;
+  int depth = 0;
+  for (unsigned i = 0; i < tokens.size(); ++i) {
+    if (tokens.Kind(i) == CXToken_Comment) continue;
+    const std::string spelling = tokens.Spelling(i);
+    const bool opening = spelling == "(" || spelling == "[" || spelling == "{";
+    const bool closing = spelling == ")" || spelling == "]" || spelling == "}";
+    if (tokens.Offset(i) > end && depth == 0) break;
+    if (closing && depth == 0) break;
+    if (depth == 0 && (spelling == "," || spelling == ";") && tokens.Offset(i) >= end) break;
+    if (opening) ++depth;
+    if (closing) --depth;
+    kept.push_back(spelling);
+  }
+  return JoinTokens(kept);
+}
+
+}  // namespace
+
+std::string TemplateHead(CXTranslationUnit unit, CXCursor function) {
+  if (clang_getCursorKind(function) != CXCursor_FunctionTemplate) return "";
+  std::string parameters;
+  for (CXCursor child : ChildrenOf(function)) {
+    if (!IsTemplateParameterKind(clang_getCursorKind(child))) continue;
+    if (!parameters.empty()) parameters += ", ";
+    parameters += TemplateParameterText(unit, child, 0);
+  }
+  return "template <" + parameters + "> ";
+}
+
+std::string WrittenParameterType(CXCursor parameter) {
+  const CXType type = clang_getCursorType(parameter);
+  std::string text = Take(clang_getTypeSpelling(type));
+  if (clang_isConstQualifiedType(type) == 0 && clang_isVolatileQualifiedType(type) == 0) {
+    return text;
+  }
+  return WithoutTopLevelQualifiers(
+      std::move(text), type.kind == CXType_Pointer || type.kind == CXType_MemberPointer);
+}
+
+std::string Signature(CXTranslationUnit unit, CXCursor function, const MethodDescription& method,
+                      const TemplateParameters& parameters) {
+  std::string signature = TemplateHead(unit, function);
+  if (method.type == "Static") signature += "static ";
+  if (method.type == "Virtual" || method.type == "PureVirtual") signature += "virtual ";
+  const bool conversion = clang_getCursorKind(function) == CXCursor_ConversionFunction ||
+                          clang_getTemplateCursorKind(function) == CXCursor_ConversionFunction;
+  if (method.returned_type && !conversion) {
+    signature += Take(clang_getTypeSpelling(clang_getCursorResultType(function))) + " ";
+  }
+  signature += method.name + "(";
+  bool first = true;
+  for (CXCursor child : ChildrenOf(function)) {
+    if (clang_getCursorKind(child) != CXCursor_ParmDecl) continue;
+    if (!first) signature += ", ";
+    first = false;
+    signature += WrittenParameterType(child);
+  }
+  const CXType type = clang_getCursorType(function);
+  if (clang_isFunctionTypeVariadic(type) != 0) signature += first ? "..." : ", ...";
+  signature += ")";
+  if (clang_CXXMethod_isConst(function)) signature += " const";
+  const std::string type_text = Take(clang_getTypeSpelling(type));
+  if (type_text.find(") volatile") != std::string::npos ||
+      type_text.find(") const volatile") != std::string::npos) {
+    signature += " volatile";
+  }
+  switch (clang_Type_getCXXRefQualifier(type)) {
+    case CXRefQualifier_LValue:
+      signature += " &";
+      break;
+    case CXRefQualifier_RValue:
+      signature += " &&";
+      break;
+    default:
+      break;
+  }
+  if (method.type == "PureVirtual") signature += " = 0";
+  return parameters.Written(signature);
+}
+
+std::optional<std::string> DefaultValue(CXTranslationUnit unit, CXCursor function,
+                                        CXCursor parameter, const TemplateParameters& parameters) {
+  std::optional<std::string> printed = PrintedDefault(parameter);
+  if (printed) printed = parameters.Rename(*printed);
+  if (!printed) return std::nullopt;
+  if (IsPointerLike(clang_getCursorType(parameter)) && IsNullPointerText(*printed)) {
+    return std::string("nullptr");
+  }
+  CXCursor expression = clang_getNullCursor();
+  for (CXCursor child : ChildrenOf(parameter)) {
+    if (clang_isExpression(clang_getCursorKind(child))) expression = child;
+  }
+  if (clang_Cursor_isNull(expression)) return printed;
+
+  // A parameter that a macro's body declares (or an unnamed one) has no
+  // tokens of its own to read: the compiler's text is the one there is.
+  if (!IsWrittenAt(parameter)) return printed;
+  const bool in_macro = IsInMacroArgument(clang_getCursorLocation(parameter));
+  CXFile file_of_name = nullptr;
+  unsigned name_offset = 0;
+  FileLocation(clang_getCursorLocation(parameter), &file_of_name, &name_offset);
+
+  // Written in the file, the default's macro calls are kept whole: it starts
+  // where its first macro is used. Written in a macro's argument, it is read
+  // where the argument is written.
+  const CXSourceRange extent = clang_getCursorExtent(expression);
+  CXFile begin_file = nullptr;
+  CXFile end_file = nullptr;
+  unsigned begin = 0;
+  unsigned end = 0;
+  if (in_macro) {
+    FileLocation(clang_getRangeStart(extent), &begin_file, &begin);
+  } else {
+    ExpansionLocation(clang_getRangeStart(extent), &begin_file, &begin);
+  }
+  FileLocation(clang_getRangeEnd(extent), &end_file, &end);
+  if (begin_file != file_of_name) return printed;
+  if (end_file != begin_file || end < begin) end = begin;
+  std::string text = DefaultTokens(unit, begin_file, begin, end, function);
+  if (text.empty()) return printed;
+  return parameters.Rename(text);
+}
+
+}  // namespace zor2::describe
