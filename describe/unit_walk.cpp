@@ -285,10 +285,11 @@ class UnitWalker {
       if (key && top >= 0) top_header_of_key_.emplace(*key, top);
     }
     if (HeaderOfFile(included) >= 0) return;
-    const std::string path = Canonical(Take(clang_getFileName(included)));
+    const std::string name = Take(clang_getFileName(included));
+    const std::string path = Canonical(name);
     if (IsUnder(path, roots_)) return;
     const int includer = HeaderOfFile(ExpansionFile(stack[0]));
-    NoteStandIn(path, includer >= 0);
+    NoteStandIn(name, path, includer >= 0);
     if (includer < 0) return;
     std::string target = IncludeDirectiveTarget(unit_, stack[0]);
     if (!target.empty() && outside_seen_.insert(target).second) {
@@ -298,7 +299,7 @@ class UnitWalker {
 
   // A file from outside the described directories whose path ends like a
   // described header's took its place: an installed copy of another release.
-  void NoteStandIn(const std::string& path, bool included_by_described) {
+  void NoteStandIn(const std::string& name, const std::string& path, bool included_by_described) {
     for (size_t slash = path.find('/'); slash != std::string::npos;
          slash = path.find('/', slash + 1)) {
       const std::string tail = path.substr(slash + 1);
@@ -307,9 +308,8 @@ class UnitWalker {
       // A bare name could be any library's; only a described header's own
       // include of it says that it was meant.
       if (tail.find('/') == std::string::npos && !included_by_described) continue;
-      outcome_->stand_ins.push_back(
-          path + " was read in place of " +
-          Canonical(IncludePath(headers_.dir, headers_.headers[found->second])));
+      outcome_->stand_ins.push_back(name + " was read in place of " +
+                                    IncludePath(headers_.dir, headers_.headers[found->second]));
       return;
     }
   }
