@@ -12,6 +12,7 @@
 #include <utility>
 
 #include "describe/clang_handles.h"
+#include "describe/include_order.h"
 #include "platform/tools/background.h"
 
 namespace zor2::describe {
@@ -28,8 +29,10 @@ std::string IncludePath(const std::string& dir, const std::string& header) {
 }
 
 std::vector<std::string> CompilerArguments(const CompileSettings& settings, bool header_language) {
+  // No error limit: clang's "too many errors" belongs to no header and would
+  // make every header be compiled on its own.
   std::vector<std::string> arguments = {"-x", header_language ? "c++-header" : "c++",
-                                        "-fparse-all-comments"};
+                                        "-fparse-all-comments", "-ferror-limit=0"};
   for (const std::string& root : settings.roots) arguments.push_back("-I" + root);
   arguments.insert(arguments.end(), settings.arguments.begin(), settings.arguments.end());
   // A root given one level too deep (include/lib rather than include) still
@@ -124,7 +127,7 @@ UnitOutcome DescribeUnit(const std::string& dir, const std::vector<std::string>&
   // diagnostic points into it; several are included by a made-up main file.
   std::string main_text;
   bool any_refused = false;
-  for (size_t h = 0; h < headers.size(); ++h) {
+  for (size_t h : IncludeOrder(dir, headers, settings.roots)) {
     const std::string path = IncludePath(dir, headers[h]);
     if (path.find_first_of("\"\n") != std::string::npos) {
       refused.diagnostics[h].push_back(path +
