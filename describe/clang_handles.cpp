@@ -1,5 +1,7 @@
 #include "describe/clang_handles.h"
 
+#include <cctype>
+
 #include "describe/token_text.h"
 
 namespace zor2::describe {
@@ -78,17 +80,28 @@ bool IsInMacroArgument(CXSourceLocation location) {
   return expansion_offset != written_offset || expansion_file != written_file;
 }
 
-bool IsWrittenAt(CXCursor cursor) {
+std::string_view SourceTexts::Of(CXFile file) {
+  const auto found = texts_.find(file);
+  if (found != texts_.end()) return found->second;
+  size_t size = 0;
+  const char* text = file != nullptr ? clang_getFileContents(unit_, file, &size) : nullptr;
+  const std::string_view view = text != nullptr ? std::string_view(text, size) : "";
+  texts_.emplace(file, view);
+  return view;
+}
+
+bool IsWrittenAt(CXCursor cursor, SourceTexts& texts) {
   const std::string name = Take(clang_getCursorSpelling(cursor));
   if (name.empty()) return false;
-  CXTranslationUnit unit = clang_Cursor_getTranslationUnit(cursor);
   CXFile file = nullptr;
   unsigned offset = 0;
   clang_getFileLocation(clang_getCursorLocation(cursor), &file, nullptr, nullptr, &offset);
   if (file == nullptr) return false;
-  const CXSourceLocation at = clang_getLocationForOffset(unit, file, offset);
-  const Tokens token(unit, clang_getRange(at, at));
-  return token.size() > 0 && token.Spelling(0) == name;
+  const std::string_view text = texts.Of(file);
+  if (text.compare(offset, name.size(), name) != 0) return false;
+  const size_t after = offset + name.size();
+  return after == text.size() ||
+         !(std::isalnum(static_cast<unsigned char>(text[after])) != 0 || text[after] == '_');
 }
 
 bool FileExtent(CXCursor cursor, CXFile* file, unsigned* begin, unsigned* end) {

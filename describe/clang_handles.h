@@ -3,9 +3,11 @@
 #include <clang-c/Index.h>
 
 #include <array>
+#include <map>
 #include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace zor2::describe {
@@ -69,10 +71,24 @@ unsigned LineOf(CXCursor cursor);
 // macro's body was written: see IsWrittenAt.)
 bool IsInMacroArgument(CXSourceLocation location);
 
+// The texts of the files of one unit, each asked of libclang once (a lookup
+// that grows with the unit).
+//
+// Thread safety: used by one thread.
+class SourceTexts {
+ public:
+  explicit SourceTexts(CXTranslationUnit unit) : unit_(unit) {}
+  std::string_view Of(CXFile file);
+
+ private:
+  CXTranslationUnit unit_;
+  std::map<CXFile, std::string_view> texts_;
+};
+
 // Whether the declaration `cursor` is written where its location says, its
 // name standing there in its file (directly, or in a macro's argument); false
 // for a declaration that a macro's body makes, or an unnamed one.
-bool IsWrittenAt(CXCursor cursor);
+bool IsWrittenAt(CXCursor cursor, SourceTexts& texts);
 
 // The offsets in its file where the extent of `cursor` begins and ends, after
 // macro expansion; false when they are in two files or the wrong way round.

@@ -87,23 +87,6 @@ std::vector<CXCursor> ParametersOf(CXCursor function) {
   return parameters;
 }
 
-// The special members that a class declares itself.
-struct DeclaredMembers {
-  bool any_constructor = false;
-  bool default_constructor = false;  // usable or not
-  bool copy_constructor = false;
-  bool move_constructor = false;
-  bool copy_assignment = false;
-  bool move_assignment = false;
-  bool destructor = false;
-  bool usable_default_constructor = false;
-  bool usable_copy_constructor = false;
-  bool usable_copy_assignment = false;
-  bool public_or_protected_constructor = false;
-  bool virtual_function = false;
-  bool virtual_destructor = false;
-};
-
 DeclaredMembers ReadDeclaredMembers(CXCursor definition) {
   DeclaredMembers declared;
   const TemplateParameters parameters = TemplateParameters::Around(definition);
@@ -169,29 +152,24 @@ std::vector<CXCursor> BasesOf(CXCursor definition) {
   return bases;
 }
 
-// Whether `definition` or a class it derives from, at any depth, declares a
-// virtual function (`destructor_only`: a virtual destructor). The bases are
-// walked with a list of their own, each once.
-bool InheritsVirtual(CXCursor definition, bool destructor_only) {
+}  // namespace
+
+// The bases are walked with a list of their own, each once.
+bool ClassFacts::InheritsVirtual(CXCursor definition, bool destructor_only) {
   std::vector<CXCursor> pending = {definition};
   std::set<std::string> seen;
   while (!pending.empty()) {
     const CXCursor at = pending.back();
     pending.pop_back();
     if (!seen.insert(Take(clang_getCursorUSR(at))).second) continue;
-    const DeclaredMembers declared = ReadDeclaredMembers(at);
+    const DeclaredMembers& declared = Declared(at);
     if (destructor_only ? declared.virtual_destructor : declared.virtual_function) return true;
     for (CXCursor base : BasesOf(at)) pending.push_back(base);
   }
   return false;
 }
 
-// What the members and bases of a class keep the compiler from providing.
-struct Obstacles {
-  bool default_constructor = false;
-  bool copy_constructor = false;
-  bool copy_assignment = false;
-};
+namespace {
 
 bool HasInitializer(CXCursor field) {
   int expressions = 0;
@@ -201,10 +179,18 @@ bool HasInitializer(CXCursor field) {
   return expressions > (clang_Cursor_isBitField(field) ? 1 : 0);
 }
 
-// A member or base of class type: what its own declarations deny.
-void AddClassObstacles(CXCursor definition, Obstacles* obstacles) {
+}  // namespace
+
+const DeclaredMembers& ClassFacts::Declared(CXCursor definition) {
+  std::string usr = Take(clang_getCursorUSR(definition));
+  const auto found = declared_.find(usr);
+  if (found != declared_.end()) return found->second;
+  return declared_.emplace(std::move(usr), ReadDeclaredMembers(definition)).first->second;
+}
+
+void ClassFacts::AddClassObstacles(CXCursor definition, Obstacles* obstacles) {
   if (clang_Cursor_isNull(definition)) return;
-  const DeclaredMembers declared = ReadDeclaredMembers(definition);
+  const DeclaredMembers& declared = Declared(definition);
   if (declared.any_constructor && !declared.usable_default_constructor) {
     obstacles->default_constructor = true;
   }
@@ -218,7 +204,7 @@ void AddClassObstacles(CXCursor definition, Obstacles* obstacles) {
   }
 }
 
-Obstacles FindObstacles(CXCursor definition) {
+ClassFacts::Obstacles ClassFacts::FindObstacles(CXCursor definition) {
   Obstacles obstacles;
   for (CXCursor base : BasesOf(definition)) AddClassObstacles(base, &obstacles);
   for (CXCursor child : ChildrenOf(definition)) {
@@ -251,6 +237,8 @@ Obstacles FindObstacles(CXCursor definition) {
   return obstacles;
 }
 
+namespace {
+
 MethodDescription ImplicitMember(std::string name, std::string signature) {
   MethodDescription method;
   method.name = std::move(name);
@@ -263,9 +251,9 @@ MethodDescription ImplicitMember(std::string name, std::string signature) {
 
 }  // namespace
 
-void AddImplicitMembers(CXCursor definition, const TemplateParameters& parameters,
-                        ClassDescription* described) {
-  const DeclaredMembers declared = ReadDeclaredMembers(definition);
+void ClassFacts::AddImplicitMembers(CXCursor definition, const TemplateParameters& parameters,
+                                    ClassDescription* described) {
+  const DeclaredMembers& declared = Declared(definition);
   const Obstacles obstacles = FindObstacles(definition);
   const std::string name = ShortName(definition);
   const SelfType self = SelfTypeOf(definition, parameters);
@@ -298,9 +286,9 @@ void AddImplicitMembers(CXCursor definition, const TemplateParameters& parameter
   }
 }
 
-bool IsDerivablePolymorphic(CXCursor definition) {
+bool ClassFacts::IsDerivablePolymorphic(CXCursor definition) {
   if (HasAttribute(definition, CXCursor_CXXFinalAttr)) return false;
-  const DeclaredMembers declared = ReadDeclaredMembers(definition);
+  const DeclaredMembers& declared = Declared(definition);
   if (declared.any_constructor && !declared.public_or_protected_constructor) return false;
   return InheritsVirtual(definition, false);
 }

@@ -21,11 +21,6 @@ void FileLocation(CXSourceLocation location, CXFile* file, unsigned* offset) {
   clang_getFileLocation(location, file, nullptr, nullptr, offset);
 }
 
-// Where a macro that produces the code at `location` is used.
-void ExpansionLocation(CXSourceLocation location, CXFile* file, unsigned* offset) {
-  clang_getExpansionLocation(location, file, nullptr, nullptr, offset);
-}
-
 // One template parameter as the head shows it. Template template parameters
 // nest as deep as the source does; past a few levels the inner heads are
 // abbreviated, so that no declaration makes this recurse without bound.
@@ -98,38 +93,35 @@ std::optional<std::string> PrintedDefault(CXCursor parameter) {
   return std::nullopt;
 }
 
-// The default argument's tokens from `begin` (an offset in `file`): every token
-// up to `end`, and past it as long as a bracket opened inside is still open
-// (the closing parenthesis of a macro call whose argument ends the expression),
-// stopping at a comma or a closing bracket of the parameter list.
-std::string DefaultTokens(CXTranslationUnit unit, CXFile file, unsigned begin, unsigned end,
-                          CXCursor function) {
-  CXFile function_end_file = nullptr;
-  unsigned function_end = 0;
-  ExpansionLocation(clang_getRangeEnd(clang_getCursorExtent(function)), &function_end_file,
-                    &function_end);
-  if (function_end_file != file || function_end < end) function_end = end;
-  size_t file_size = 0;
-  clang_getFileContents(unit, file, &file_size);
-  const unsigned last = std::min<unsigned>(function_end + 1, static_cast<unsigned>(file_size));
-  const CXSourceRange range = clang_getRange(clang_getLocationForOffset(unit, file, begin),
-                                             clang_getLocationForOffset(unit, file, last));
-  const Tokens tokens(unit, range);
+// The default argument among `tokens`, those of the parameter and maybe what
+// follows it: from the first '=' outside brackets, every token up to the
+// offset `end` where its expression ends, and past it as long as a bracket
+// opened inside is still open (the closing parenthesis of a macro call whose
+// argument ends the expression); nothing when the tokens end first.
+std::optional<std::string> DefaultTokens(const Tokens& tokens, unsigned end) {
+  unsigned i = 0;
+  for (int depth = 0; i < tokens.size(); ++i) {
+    const std::string spelling = tokens.Spelling(i);
+    if (spelling == "(" || spelling == "[" || spelling == "{") ++depth;
+    if (spelling == ")" || spelling == "]" || spelling == "}") --depth;
+    if (depth == 0 && spelling == "=") break;
+  }
   std::vector<std::string> kept;
   int depth = 0;
-  for (unsigned i = 0; i < tokens.size(); ++i) {
+  for (++i; i < tokens.size(); ++i) {
     if (tokens.Kind(i) == CXToken_Comment) continue;
     const std::string spelling = tokens.Spelling(i);
     const bool opening = spelling == "(" || spelling == "[" || spelling == "{";
     const bool closing = spelling == ")" || spelling == "]" || spelling == "}";
-    if (tokens.Offset(i) > end && depth == 0) break;
-    if (closing && depth == 0) break;
-    if (depth == 0 && (spelling == "," || spelling == ";") && tokens.Offset(i) >= end) break;
+    const bool past_end = tokens.Offset(i) > end;
+    if (past_end && depth == 0) return JoinTokens(kept);
+    if (closing && depth == 0) return JoinTokens(kept);
     if (opening) ++depth;
     if (closing) --depth;
     kept.push_back(spelling);
   }
-  return JoinTokens(kept);
+  if (depth == 0 && !kept.empty()) return JoinTokens(kept);
+  return std::nullopt;
 }
 
 }  // namespace
@@ -197,46 +189,45 @@ std::string Signature(CXTranslationUnit unit, CXCursor function, const MethodDes
 }
 
 std::optional<std::string> DefaultValue(CXTranslationUnit unit, CXCursor function,
-                                        CXCursor parameter, const TemplateParameters& parameters) {
-  std::optional<std::string> printed = PrintedDefault(parameter);
-  if (printed) printed = parameters.Rename(*printed);
-  if (!printed) return std::nullopt;
-  if (IsPointerLike(clang_getCursorType(parameter)) && IsNullPointerText(*printed)) {
-    return std::string("nullptr");
-  }
+                                        CXCursor parameter, const TemplateParameters& parameters,
+                                        SourceTexts& texts) {
   CXCursor expression = clang_getNullCursor();
   for (CXCursor child : ChildrenOf(parameter)) {
     if (clang_isExpression(clang_getCursorKind(child))) expression = child;
   }
-  if (clang_Cursor_isNull(expression)) return printed;
-
+  if (clang_Cursor_isNull(expression)) return std::nullopt;
+  std::optional<std::string> printed = PrintedDefault(parameter);
+  if (!printed) return std::nullopt;
+  printed = parameters.Rename(*printed);
+  if (IsPointerLike(clang_getCursorType(parameter)) && IsNullPointerText(*printed)) {
+    return std::string("nullptr");
+  }
   // A parameter that a macro's body declares (or an unnamed one) has no
   // tokens of its own to read: the compiler's text is the one there is.
-  if (!IsWrittenAt(parameter)) return printed;
-  const bool in_macro = IsInMacroArgument(clang_getCursorLocation(parameter));
-  CXFile file_of_name = nullptr;
-  unsigned name_offset = 0;
-  FileLocation(clang_getCursorLocation(parameter), &file_of_name, &name_offset);
+  if (!IsWrittenAt(parameter, texts)) return printed;
 
-  // Written in the file, the default's macro calls are kept whole: it starts
-  // where its first macro is used. Written in a macro's argument, it is read
-  // where the argument is written.
-  const CXSourceRange extent = clang_getCursorExtent(expression);
-  CXFile begin_file = nullptr;
+  // The parameter's own tokens, read where they are written (a macro's
+  // argument included); when its default ends inside a macro call, up to the
+  // next parameter or the end of the declaration.
   CXFile end_file = nullptr;
-  unsigned begin = 0;
   unsigned end = 0;
-  if (in_macro) {
-    FileLocation(clang_getRangeStart(extent), &begin_file, &begin);
-  } else {
-    ExpansionLocation(clang_getRangeStart(extent), &begin_file, &begin);
+  FileLocation(clang_getRangeEnd(clang_getCursorExtent(expression)), &end_file, &end);
+  const CXSourceRange own = clang_getCursorExtent(parameter);
+  std::optional<std::string> text = DefaultTokens(Tokens(unit, own), end);
+  if (!text) {
+    CXSourceLocation bound = clang_getRangeEnd(clang_getCursorExtent(function));
+    bool after = false;
+    for (CXCursor sibling : ChildrenOf(function)) {
+      if (after && clang_getCursorKind(sibling) == CXCursor_ParmDecl) {
+        bound = clang_getCursorLocation(sibling);
+        break;
+      }
+      after = after || clang_equalCursors(sibling, parameter);
+    }
+    text = DefaultTokens(Tokens(unit, clang_getRange(clang_getRangeStart(own), bound)), end);
   }
-  FileLocation(clang_getRangeEnd(extent), &end_file, &end);
-  if (begin_file != file_of_name) return printed;
-  if (end_file != begin_file || end < begin) end = begin;
-  std::string text = DefaultTokens(unit, begin_file, begin, end, function);
-  if (text.empty()) return printed;
-  return parameters.Rename(text);
+  if (!text || text->empty()) return printed;
+  return parameters.Rename(*text);
 }
 
 }  // namespace zor2::describe

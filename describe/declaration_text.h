@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "describe/clang_handles.h"
 #include "describe/interface_model.h"
 #include "describe/type_spelling.h"
 
@@ -40,7 +41,9 @@ std::string WrittenParameterType(CXCursor parameter);
 // comes from a macro's body; "nullptr" for any null pointer constant given to
 // a pointer; template parameters named by their position, as in types.
 // Nothing when the parameter has no default argument.
+// `texts` holds the unit's file texts.
 std::optional<std::string> DefaultValue(CXTranslationUnit unit, CXCursor function,
-                                        CXCursor parameter, const TemplateParameters& parameters);
+                                        CXCursor parameter, const TemplateParameters& parameters,
+                                        SourceTexts& texts);
 
 }  // namespace zor2::describe

@@ -5,6 +5,10 @@
 namespace zor2::describe {
 
 std::string DocumentText(std::string_view text) {
+  // Most texts are printable ASCII, which stays as it is.
+  bool plain = true;
+  for (char c : text) plain = plain && c >= 0x20 && c < 0x7F;
+  if (plain) return std::string(text);
   static constexpr char kHex[] = "0123456789ABCDEF";
   std::string kept;
   kept.reserve(text.size());

@@ -162,6 +162,21 @@ TemplateParameters TemplateParameters::Around(CXCursor declaration) {
   return TemplateParameters(std::move(levels));
 }
 
+TemplateParameters TemplateParameters::With(CXCursor function) const {
+  if (clang_getCursorKind(function) != CXCursor_FunctionTemplate) return *this;
+  std::vector<std::vector<Parameter>> levels = levels_;
+  const auto depth = static_cast<unsigned>(levels.size());
+  std::vector<Parameter> parameters;
+  for (CXCursor child : ChildrenOf(function)) {
+    if (!IsTemplateParameterKind(clang_getCursorKind(child))) continue;
+    const auto index = static_cast<unsigned>(parameters.size());
+    parameters.push_back({Take(clang_getCursorSpelling(child)), PositionalName(depth, index),
+                          IsTemplateParameterPack(child)});
+  }
+  levels.push_back(std::move(parameters));
+  return TemplateParameters(std::move(levels));
+}
+
 const TemplateParameters::Parameter* TemplateParameters::At(unsigned depth, unsigned index) const {
   if (depth >= levels_.size() || index >= levels_[depth].size()) return nullptr;
   return &levels_[depth][index];

@@ -41,6 +41,11 @@ class TemplateParameters {
   // templates that enclose it.
   static TemplateParameters Around(CXCursor declaration);
 
+  // These parameters and, one level in, those of `function` when it is a
+  // function template: what a member function of the class that these
+  // parameters surround sees.
+  TemplateParameters With(CXCursor function) const;
+
   // The positional name of the parameter `index` (from 0) of the template at
   // `depth` (0 for the outermost).
   static std::string PositionalName(unsigned depth, unsigned index);

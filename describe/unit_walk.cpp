@@ -380,11 +380,18 @@ class UnitWalker {
     size_t next = 0;
     int header = -1;  // the header of the class being walked; -1 in a namespace
     size_t class_index = 0;
+    TemplateParameters parameters;  // those the class's members see
   };
+
+  static Scope NamespaceScope(CXCursor cursor) {
+    Scope scope;
+    scope.children = ChildrenOf(cursor);
+    return scope;
+  }
 
   void Walk() {
     std::vector<Scope> open;
-    open.push_back({ChildrenOf(clang_getTranslationUnitCursor(unit_))});
+    open.push_back(NamespaceScope(clang_getTranslationUnitCursor(unit_)));
     for (CXCursor top : open.back().children) {
       const int header = HeaderOfFile(ExpansionFile(clang_getCursorLocation(top)));
       if (header >= 0) declares_.insert(header);
@@ -404,11 +411,12 @@ class UnitWalker {
         if (std::optional<Scope> inner = EnterClass(cursor)) open.push_back(std::move(*inner));
       } else if (in_class && IsMemberFunctionKind(kind)) {
         ClassDescription& owner = ClassAt(scope);
-        if (std::optional<MethodDescription> method = DescribeMethod(cursor, owner, true)) {
+        if (std::optional<MethodDescription> method =
+                DescribeMethod(cursor, owner, true, scope.parameters.With(cursor))) {
           owner.methods.push_back(std::move(*method));
         }
       } else if (!in_class && (kind == CXCursor_Namespace || IsLinkageKind(kind))) {
-        if (HeaderOf(cursor) >= 0) open.push_back({ChildrenOf(cursor)});
+        if (HeaderOf(cursor) >= 0) open.push_back(NamespaceScope(cursor));
       } else if (!in_class &&
                  (kind == CXCursor_FunctionDecl || kind == CXCursor_FunctionTemplate)) {
         AddFreeFunction(cursor);
@@ -435,11 +443,12 @@ class UnitWalker {
                                Deprecation(cursor, tags),
                                {},
                                LineOf(cursor)};
-    if (IsDerivablePolymorphic(cursor)) derivable_[header] = true;
+    if (class_facts_.IsDerivablePolymorphic(cursor)) derivable_[header] = true;
     std::vector<CXCursor> children = ChildrenOf(cursor);
     classes.push_back(std::move(described));
-    implicit_pending_.emplace_back(header, classes.size() - 1, cursor);
-    return Scope{std::move(children), 0, header, classes.size() - 1};
+    TemplateParameters parameters = TemplateParameters::Around(cursor);
+    implicit_pending_.push_back({header, classes.size() - 1, cursor, parameters});
+    return Scope{std::move(children), 0, header, classes.size() - 1, std::move(parameters)};
   }
 
   void AddFreeFunction(CXCursor cursor) {
@@ -451,7 +460,8 @@ class UnitWalker {
     // described once.
     if (!seen_functions_[header].insert(Take(clang_getCursorUSR(cursor))).second) return;
     ClassDescription owner{*holder, "N", std::nullopt, {}, 0};
-    std::optional<MethodDescription> method = DescribeMethod(cursor, owner, false);
+    std::optional<MethodDescription> method =
+        DescribeMethod(cursor, owner, false, TemplateParameters::Around(cursor));
     if (!method) return;
     auto& holders = free_functions_[header];
     auto found = std::find_if(holders.begin(), holders.end(),
@@ -466,13 +476,13 @@ class UnitWalker {
   // Describes a member function of `owner` or, when `member` is false, a free
   // function; nothing for a deleted one, which nobody can call.
   std::optional<MethodDescription> DescribeMethod(CXCursor cursor, const ClassDescription& owner,
-                                                  bool member) {
+                                                  bool member,
+                                                  const TemplateParameters& parameters) {
     if (clang_getCursorAvailability(cursor) == CXAvailability_NotAvailable) return std::nullopt;
     const CXCursorKind kind = clang_getCursorKind(cursor);
     const CXCursorKind function_kind =
         kind == CXCursor_FunctionTemplate ? clang_getTemplateCursorKind(cursor) : kind;
     const DeclarationTags tags = TagsOf(cursor);
-    const TemplateParameters parameters = TemplateParameters::Around(cursor);
 
     MethodDescription method;
     method.name = Take(clang_getCursorSpelling(cursor));
@@ -509,7 +519,7 @@ class UnitWalker {
       ArgDescription arg;
       arg.type = ParameterTypeIdentity(clang_getCursorType(child), parameters);
       arg.name = Take(clang_getCursorSpelling(child));
-      arg.value = DefaultValue(unit_, cursor, child, parameters);
+      arg.value = DefaultValue(unit_, cursor, child, parameters, texts_);
       arg.retval = !arg.name.empty() && retval_names.erase(arg.name) > 0;
       method.args.push_back(std::move(arg));
     }
@@ -535,9 +545,9 @@ class UnitWalker {
   // header that holds code but got nothing from the unit is to be compiled on
   // its own.
   void FinishFiles() {
-    for (const auto& [header, index, cursor] : implicit_pending_) {
-      ClassDescription& described = outcome_->files[header]->classes[index];
-      AddImplicitMembers(cursor, TemplateParameters::Around(cursor), &described);
+    for (const PendingClass& pending : implicit_pending_) {
+      ClassDescription& described = outcome_->files[pending.header]->classes[pending.index];
+      class_facts_.AddImplicitMembers(pending.definition, pending.parameters, &described);
     }
     for (size_t h = 0; h < headers_.headers.size(); ++h) {
       if (!described_[h]) continue;
@@ -559,6 +569,8 @@ class UnitWalker {
   const std::string& main_name_;
   UnitOutcome* outcome_;
   std::vector<std::string> roots_;
+  ClassFacts class_facts_;
+  SourceTexts texts_{unit_};
 
   std::vector<CXFile> files_;
   std::map<std::string, int> header_of_name_;
@@ -568,7 +580,14 @@ class UnitWalker {
   std::vector<bool> described_;
   std::vector<bool> derivable_;
   std::set<int> declares_;  // headers with a declaration of their own in the unit
-  std::vector<std::tuple<int, size_t, CXCursor>> implicit_pending_;
+  // The classes described, to be given the members the compiler declares.
+  struct PendingClass {
+    int header;
+    size_t index;
+    CXCursor definition;
+    TemplateParameters parameters;
+  };
+  std::vector<PendingClass> implicit_pending_;
   // Per header: the classes of its free functions, in the order they first
   // appear, and the functions already described.
   std::vector<std::vector<std::pair<std::string, std::vector<MethodDescription>>>> free_functions_;
