@@ -38,6 +38,12 @@ expect_not_in() {
   fi
 }
 
+# The README shows the example's CMakeLists.txt, less its opening comment.
+if ! diff -u <(awk '/^```cmake$/ { shown = 1; next } /^```$/ { shown = 0 } shown' \
+  "$source/README.md") <(grep -v '^#' "$source/examples/geometry/CMakeLists.txt"); then
+  fail "the README's CMake project is not examples/geometry/CMakeLists.txt"
+fi
+
 run install.log cmake --install "$build" --prefix "$prefix"
 cp -R "$source/examples/geometry" "$project"
 run configure.log cmake -S "$project" -B "$project/build" -DCMAKE_PREFIX_PATH="$prefix"
