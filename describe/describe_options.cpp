@@ -5,6 +5,7 @@
 
 #include "platform/tools/argument_file.h"
 #include "platform/tools/printable_path.h"
+#include "platform/tools/version.h"
 
 namespace zor2::describe {
 
@@ -116,8 +117,12 @@ std::optional<DescribeStatus> ReadDescribeCommandLine(int argc, const char* cons
       failed = true;
       break;
     }
-    if (item == "-h") {
+    if (item == "-h" || item == "--help") {
       out << kDescribeUsage;
+      return DescribeStatus::kDone;
+    }
+    if (item == "--version") {
+      out << "zor2describe " << kVersion << '\n';
       return DescribeStatus::kDone;
     }
     if (i + 1 < items.size() && TakeValue(item, items[i + 1], options, &given)) {

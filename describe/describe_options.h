@@ -10,7 +10,7 @@ namespace zor2::describe {
 
 // The exit statuses of zor2describe, as zor2check's.
 enum class DescribeStatus : int {
-  kDone = 0,        // every header described, or "-h"
+  kDone = 0,        // every header described, or "-h", "--help", "--version"
   kUsageError = 1,  // nothing was done
   kIncomplete = 2,  // a header did not compile, a directory could not be read, or the
                     // document could not be written
@@ -41,7 +41,8 @@ bool IsKnownStandard(std::string_view standard);
 // of the argument file named by the two arguments "=" and a path. Fills
 // `options` and returns nothing when the run may go on; otherwise returns the
 // status to end with, having written the usage errors and the usage text to
-// `err` (or, for "-h", the usage text to `out`).
+// `err` (or, for "-h" and "--help", the usage text to `out`; for "--version",
+// the program's name and release).
 std::optional<DescribeStatus> ReadDescribeCommandLine(int argc, const char* const* argv,
                                                       DescribeOptions* options, std::ostream& out,
                                                       std::ostream& err);

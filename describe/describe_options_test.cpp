@@ -4,6 +4,7 @@
 
 #include <sstream>
 
+#include "platform/tools/version.h"
 #include "tests/test_util.h"
 
 namespace zor2::describe {
@@ -84,6 +85,21 @@ TEST(ReadDescribeCommandLine, HelpWinsUnlessTakenAsAValue) {
   const Outcome value = Read({"-framework", "-h", "-public", "p", "-o", "o.xml"});
   EXPECT_FALSE(value.status.has_value());
   EXPECT_EQ(value.options.framework, "-h");
+}
+
+TEST(ReadDescribeCommandLine, LongFormsForHelpAndVersion) {
+  const Outcome help = Read({"--help"});
+  EXPECT_EQ(help.status, DescribeStatus::kDone);
+  EXPECT_EQ(help.out, kDescribeUsage);
+
+  const Outcome version = Read({"-o", "o.xml", "--version", "-public"});
+  EXPECT_EQ(version.status, DescribeStatus::kDone);
+  EXPECT_EQ(version.out, std::string("zor2describe ") + kVersion + "\n");
+  EXPECT_EQ(version.err, "");
+
+  // Only the long forms: a near miss is an unknown option.
+  const Outcome near_miss = Read({"-version"});
+  EXPECT_EQ(near_miss.status, DescribeStatus::kUsageError);
 }
 
 class ArgumentFileTest : public testing::TempDirTest {};

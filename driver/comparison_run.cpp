@@ -41,13 +41,12 @@
 #include "platform/tools/log.h"
 #include "platform/tools/paths.h"
 #include "platform/tools/printable_path.h"
+#include "platform/tools/version.h"
 #include "platform/xml/output_element.h"
 #include "rules/framework_comparison.h"
 
 namespace zor2 {
 namespace {
-
-constexpr const char* kToolVersion = "zor2check 2.0";
 
 enum class InputMode { kFilePair, kDirectoryPair, kUnusable };
 
@@ -232,8 +231,8 @@ class ComparisonRun {
   std::vector<std::future<std::string>> StartExports() {
     std::vector<std::future<std::string>> exports;
     if (config_.export_paths.empty()) return exports;
-    run_ = RunDescription{kToolVersion, config_.reference_path, config_.checked_path,
-                          config_.output_path, config_.items};
+    run_ = RunDescription{std::string("zor2check ") + kVersion, config_.reference_path,
+                          config_.checked_path, config_.output_path, config_.items};
     for (const std::string& path : config_.export_paths) {
       exports.push_back(RunInBackground([this, &path] {
         std::string err;

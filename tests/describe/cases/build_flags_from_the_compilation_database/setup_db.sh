@@ -1,5 +1,7 @@
 # A build whose compilation database holds the include directory, a definition and the standard
-# the headers need; the paths in it are relative to the build's directory.
+# the headers need; the paths in it are relative to the build's directory. Git keeps no empty
+# directory, so the build's is made here.
+mkdir -p build
 cat > build/compile_commands.json <<JSON
 [
   {"directory": "$PWD/build", "file": "../src/other/widget.cpp",
