@@ -5,9 +5,9 @@
 #include <system_error>
 
 #include "documents/type_name_normalization.h"
+#include "documents/value_preparation.h"
 #include "platform/tools/background.h"
 #include "platform/tools/paths.h"
-#include "platform/tools/xml_escaping.h"
 #include "platform/xml/reader.h"
 
 namespace zor2 {
@@ -42,15 +42,6 @@ uintmax_t PairBytes(const PairReader::Paths& paths) {
 }
 
 }  // namespace
-
-// Both steps in one pass give each value what one pass over the document per
-// step would give it, at half the walks.
-bool PrepareValue(std::string_view value, std::string* rewritten) {
-  std::string normalized;
-  if (!NormalizeTypeNames(value, &normalized)) return DecodeXmlReferences(value, rewritten);
-  if (!DecodeXmlReferences(normalized, rewritten)) *rewritten = std::move(normalized);
-  return true;
-}
 
 bool ListDocumentPairs(const std::string& reference_dir, const std::string& checked_dir,
                        std::vector<PairReader::Paths>* pairs, std::vector<std::string>* missing,

@@ -36,12 +36,6 @@ struct LoadedPair {
   LoadedDocument checked;
 };
 
-// Prepares one attribute value of an input document for the rules, as a value
-// rewrite (xml::ValueRewrite): type names are normalised before entity
-// references are decoded, so that the normalisation only ever sees the text
-// as written in the document.
-bool PrepareValue(std::string_view value, std::string* rewritten);
-
 // Reads the documents at `reference` and `checked`, each on its own thread,
 // and prepares every attribute value of each, keeping the original text of
 // the values it changes when `keep_originals` is set. Returns when both are

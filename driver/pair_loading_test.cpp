@@ -10,21 +10,6 @@
 namespace zor2 {
 namespace {
 
-std::string Prepared(std::string_view value) {
-  return testing::Rewritten(PrepareValue, value);
-}
-
-TEST(PrepareValueTest, NormalisesTypeNamesThenDecodesReferences) {
-  EXPECT_EQ(Prepared("int"), "<unchanged>");
-  EXPECT_EQ(Prepared("unsigned long"), "QEXULONG32");
-  EXPECT_EQ(Prepared("a &amp; b"), "a & b");
-  EXPECT_EQ(Prepared("const unsigned long long &amp;"), "const QEXULONG64 &");
-  EXPECT_EQ(Prepared("f(long a, long  long b)"), "f(QEXLONG32 a, QEXLONG64 b)");
-  // Decoding comes second: a name spelled with a reference is not normalised.
-  EXPECT_EQ(Prepared("&#108;ong"), "long");
-  EXPECT_EQ(Prepared("long&#32;long"), "QEXLONG32 QEXLONG32");
-}
-
 using LoadPairTest = testing::TempDirTest;
 
 // Documents that cannot be read or parsed are in the end-to-end cases.
