@@ -509,8 +509,8 @@ bool Refuse(ReadError* err, int error_number) {
   return false;
 }
 
-// The most memory the process could ever hold: the machine's memory and swap,
-// or less when the process is limited.
+}  // namespace
+
 uintmax_t MemoryLimit() {
   uintmax_t limit = std::numeric_limits<uintmax_t>::max();
   struct sysinfo machine;
@@ -526,11 +526,14 @@ uintmax_t MemoryLimit() {
   return limit;
 }
 
+namespace {
+
 // Reads the regular file at `path` in one piece into `text`, with spare
 // capacity after it for values that preparation makes longer. It is opened
 // without blocking, since a named pipe (or a device) may stand where a regular
 // file was seen a moment before; only a regular file is read.
-bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
+bool ReadWholeFile(const std::string& path, uintmax_t memory_limit, TextBuffer* text,
+                   ReadError* err) {
   FileDescriptor file(::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
   if (!file.valid()) return Refuse(err, errno);
   struct stat status;
@@ -541,7 +544,7 @@ bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
     return false;
   }
   // A document that could never be held is refused before any of it is read.
-  if (static_cast<uintmax_t>(status.st_size) >= MemoryLimit()) {
+  if (static_cast<uintmax_t>(status.st_size) >= memory_limit) {
     err->reason = kNotEnoughMemory;
     return false;
   }
@@ -575,9 +578,14 @@ bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
 
 bool ReadDocumentFile(const std::string& path, std::unique_ptr<Document>* document,
                       ReadError* err) {
+  return ReadDocumentFile(path, MemoryLimit(), document, err);
+}
+
+bool ReadDocumentFile(const std::string& path, uintmax_t memory_limit,
+                      std::unique_ptr<Document>* document, ReadError* err) {
   *err = ReadError{};
   TextBuffer text;
-  if (!ReadWholeFile(path, &text, err)) return false;
+  if (!ReadWholeFile(path, memory_limit, &text, err)) return false;
   return Parser::Read(std::move(text), document, err);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -30,6 +31,15 @@ namespace zor2::xml {
 // ever hold) or is not well-formed (the first fault, with its line and column).
 // Other allocation failures throw std::bad_alloc.
 bool ReadDocumentFile(const std::string& path, std::unique_ptr<Document>* document, ReadError* err);
+
+// The same, with the memory the process could ever hold measured once
+// (MemoryLimit) for the many documents of a run.
+bool ReadDocumentFile(const std::string& path, uintmax_t memory_limit,
+                      std::unique_ptr<Document>* document, ReadError* err);
+
+// The most memory the process could ever hold: the machine's memory and swap,
+// or less when the process is limited.
+uintmax_t MemoryLimit();
 
 // Reads a document held in memory (copied first); same contract.
 bool ReadDocumentText(std::string_view text, std::unique_ptr<Document>* document, ReadError* err);
