@@ -27,9 +27,10 @@ LoadedDocument LoadDocument(const std::string& path, bool keep_originals, uintma
   LoadedDocument loaded{
       path, nullptr, {}, xml::OriginalValues(MayNormalizeTypeNames, MayHoldNormalizedTypeNames)};
   try {
-    if (xml::ReadDocumentFile(path, memory_limit, &loaded.document, &loaded.error)) {
-      loaded.document->RewriteValues(PrepareValue, keep_originals ? &loaded.originals : nullptr);
-    }
+    // Values are prepared as the document is read.
+    const xml::ReadPreparation preparation{PrepareValue,
+                                           keep_originals ? &loaded.originals : nullptr};
+    xml::ReadDocumentFile(path, memory_limit, preparation, &loaded.document, &loaded.error);
   } catch (const std::bad_alloc&) {
     loaded.document.reset();
     loaded.error = xml::ReadError{xml::kNotEnoughMemory, 0, 0};

@@ -75,21 +75,26 @@ class OriginalValues {
 
  private:
   friend class Document;
+  friend class Parser;
   struct Entry {
     const char* value;     // where the rewritten value stands
     const char* original;  // zero-terminated, in chunks_
   };
-  // A pass visits values in document order, so each run comes in increasing
-  // order of place: values rewritten where they stood, and values given a new
-  // place (but for rebuilt blocks, which Seal sorts).
-  void Add(const char* value, std::string_view original, bool in_place);
+  // Whether the original of a changed value is kept.
+  bool WorthKeeping(std::string_view original) const {
+    return worth_keeping_ == nullptr || worth_keeping_(original);
+  }
+  // Values come in document order, so each run comes in increasing order of
+  // place but for blocks placed out of line, which Seal sorts: values in the
+  // document's text, and values in blocks of their own.
+  void Add(const char* value, std::string_view original, bool in_text);
   void Seal();
   void Clear();
 
   Test worth_keeping_;
   Test may_be_kept_;
-  std::deque<Entry> in_place_;
-  std::deque<Entry> moved_;
+  std::deque<Entry> in_text_;
+  std::deque<Entry> out_of_line_;
   // The original texts, in chunks that never move: no copying as they grow.
   std::vector<std::unique_ptr<char[]>> chunks_;
   char* next_ = nullptr;
@@ -114,25 +119,20 @@ class Document {
   // Applies `rewrite` to every attribute value of every element; a rewritten
   // value replaces the old one. Values read before may be changed in place.
   // With `originals`, the old text of every value that changed is kept there.
+  // (The reader can apply a rewrite as it reads, at no extra pass: see
+  // ReadDocumentFile.)
   void RewriteValues(ValueRewrite rewrite, OriginalValues* originals = nullptr);
 
  private:
   friend class Parser;
-  struct RewritePass;
   Element* NewElement(const char* block);
-  // `size` bytes of the text's spare capacity, or null when it is used up.
-  // Pages of a large buffer that are never used cost no memory.
-  char* AllocateSpare(size_t size);
-  void RewriteAll(RewritePass& pass);
-  void RewriteElement(Element& element, RewritePass& pass);
-  // Returns where the value now stands, or null when it could not move.
-  const char* MoveValue(char* slot, size_t room, std::string_view text);
-  void RebuildBlock(Element& element, RewritePass& pass);
+  // Places a finished block of `size` bytes at `*out` in the text when it
+  // ends by `limit`, else in the block arena; returns where it now stands.
+  char* PlaceBlock(std::string_view block, char*& out, const char* limit);
 
-  TextBuffer text_;        // the document as UTF-8
-  size_t spare_used_ = 0;  // of the capacity after the text's sentinel
+  TextBuffer text_;  // the document as UTF-8, then its blocks
   Arena elements_;
-  Arena blocks_;  // attribute blocks rebuilt for values that grew
+  Arena blocks_;  // blocks that did not fit in the text
   Element* root_ = nullptr;
 };
 
