@@ -1,16 +1,42 @@
 #include "platform/xml/document.h"
 
+#include <sys/mman.h>
+#include <unistd.h>
+
 #include <algorithm>
 #include <cstring>
 #include <functional>
 #include <new>
 #include <string>
+#include <type_traits>
 #include <vector>
 
 namespace zor2::xml {
 
-// Three pointers: an element costs nothing beyond this and its block.
-static_assert(sizeof(void*) != 8 || sizeof(Element) == 24);
+static_assert(sizeof(void*) != 8 || sizeof(Element) == 12);
+static_assert(std::is_trivially_destructible_v<Element>, "elements are unmapped, not destroyed");
+
+ElementStore::~ElementStore() {
+  if (elements_ != nullptr) ::munmap(elements_, capacity_ * sizeof(Element));
+}
+
+size_t ElementStore::Add(const char* block) {
+  if (size_ == capacity_) {
+    // Whole pages, doubled each time; the links are distances, so moving the
+    // pages moves nothing else.
+    const size_t page = static_cast<size_t>(::sysconf(_SC_PAGESIZE));
+    const size_t old_bytes = capacity_ * sizeof(Element);
+    const size_t new_bytes = old_bytes == 0 ? 16 * page : 2 * old_bytes;
+    void* grown = elements_ == nullptr ? ::mmap(nullptr, new_bytes, PROT_READ | PROT_WRITE,
+                                                MAP_PRIVATE | MAP_ANONYMOUS, -1, 0)
+                                       : ::mremap(elements_, old_bytes, new_bytes, MREMAP_MAYMOVE);
+    if (grown == MAP_FAILED || size_ >= (size_t{1} << 31)) throw std::bad_alloc();
+    elements_ = static_cast<Element*>(grown);
+    capacity_ = new_bytes / sizeof(Element);
+  }
+  ::new (&elements_[size_]) Element(block);
+  return size_++;
+}
 
 void Element::FindAttributes(std::span<const std::string_view> names,
                              std::span<const char*> values) const {
@@ -19,7 +45,7 @@ void Element::FindAttributes(std::span<const std::string_view> names,
   // starts after the name found last, since callers mostly ask in the order
   // in which elements hold their attributes.
   size_t next = 0;
-  BlockAttributes walk(block_);
+  BlockAttributes walk(block());
   std::string_view name;
   std::string_view value;
   while (walk.Next(name, value)) {
@@ -32,11 +58,6 @@ void Element::FindAttributes(std::span<const std::string_view> names,
       }
     }
   }
-}
-
-Element* Document::NewElement(const char* block) {
-  void* memory = elements_.Allocate(sizeof(Element), alignof(Element));
-  return ::new (memory) Element(block);
 }
 
 char* Document::PlaceBlock(std::string_view block, char*& out, const char* limit) {
@@ -107,11 +128,10 @@ void Document::RewriteValues(ValueRewrite rewrite, OriginalValues* originals) {
     std::string original;  // copied: the old block may be overwritten
   };
   std::vector<Kept> kept;
-  // Document order, without recursion: `open` holds the ancestors of
-  // `element`.
-  std::vector<Element*> open;
-  for (Element* element = root_;;) {
-    const char* old_block = element->block_;
+  // The array is in document order.
+  for (size_t i = 0; i < elements_.size(); ++i) {
+    Element* element = &elements_[i];
+    const char* old_block = element->block();
     block.assign(old_block, std::strlen(old_block) + 1);
     kept.clear();
     bool changed = false;
@@ -136,26 +156,12 @@ void Document::RewriteValues(ValueRewrite rewrite, OriginalValues* originals) {
     if (changed) {
       char* in_place = const_cast<char*>(old_block);  // the document's own memory
       const char* old_end = walk.position() + 1;
-      element->block_ = PlaceBlock(block, in_place, old_end);
-      for (const Kept& k : kept) {
-        originals->Add(element->block_ + k.offset, k.original, element->block_ == old_block);
-      }
+      const char* placed = PlaceBlock(block, in_place, old_end);
+      element->set_block(placed);
+      for (const Kept& k : kept) originals->Add(placed + k.offset, k.original, placed == old_block);
     }
-    if (element->first_child_ != nullptr) {
-      open.push_back(element);
-      element = element->first_child_;
-      continue;
-    }
-    while (element->next_ == nullptr) {
-      if (open.empty()) {
-        if (originals != nullptr) originals->Seal();
-        return;
-      }
-      element = open.back();
-      open.pop_back();
-    }
-    element = element->next_;
   }
+  if (originals != nullptr) originals->Seal();
 }
 
 }  // namespace zor2::xml

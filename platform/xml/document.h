@@ -1,6 +1,8 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
+#include <cstring>
 #include <deque>
 #include <memory>
 #include <optional>
@@ -16,21 +18,25 @@ namespace zor2::xml {
 
 class Document;
 class Parser;
+class Element;
 
 // An element of a parsed document: a tag, attributes and child elements, all
 // read-only. Elements live in their document's memory and point into its text
-// (see document_storage.h); they are valid as long as their document.
+// (see document_storage.h); they are valid as long as their document. They
+// stand in document order in one array, so that an element's first child is
+// the element after it, and its next sibling is found by a distance: twelve
+// bytes an element.
 class Element {
  public:
   Element(const Element&) = delete;
   Element& operator=(const Element&) = delete;
 
-  const char* tag() const { return block_; }
-  const Element* first_child() const { return first_child_; }
-  const Element* next_sibling() const { return next_; }
+  const char* tag() const { return block(); }
+  const Element* first_child() const { return (links_ & 1) != 0 ? this + 1 : nullptr; }
+  const Element* next_sibling() const { return links_ > 1 ? this + (links_ >> 1) : nullptr; }
 
   // The value of attribute `name`, or null when the element has none.
-  const char* FindAttribute(const char* name) const { return FindBlockValue(block_, name); }
+  const char* FindAttribute(const char* name) const { return FindBlockValue(block(), name); }
   // Looks up several attributes in one walk over this element's attributes:
   // values[i] is set to what FindAttribute(names[i]) answers. Quickest when
   // `names` follow the order in which the element holds its attributes.
@@ -40,12 +46,46 @@ class Element {
  private:
   friend class Document;
   friend class Parser;
-  explicit Element(const char* block) : block_(block) {}
+  friend class ElementStore;
+  explicit Element(const char* block) { set_block(block); }
 
-  // The tag, followed by the attributes (document_storage.h).
-  const char* block_;
-  Element* next_ = nullptr;
-  Element* first_child_ = nullptr;
+  // The tag, followed by the attributes (document_storage.h), kept in two
+  // halves so that an element needs no more than four-byte alignment.
+  const char* block() const {
+    const char* block;
+    std::memcpy(&block, block_, sizeof block);
+    return block;
+  }
+  void set_block(const char* block) { std::memcpy(block_, &block, sizeof block); }
+
+  uint32_t block_[sizeof(const char*) / sizeof(uint32_t)];
+  // Bit 0: the element has children; the others: the distance to the next
+  // sibling in the array, 0 when there is none.
+  uint32_t links_ = 0;
+};
+
+// The elements of a document, in document order, in one block of memory that
+// grows without copying (its pages are remapped), so that links between
+// elements can be distances. An element's address changes as the store grows:
+// a reader holds indexes until it is done.
+class ElementStore {
+ public:
+  ElementStore() = default;
+  ElementStore(const ElementStore&) = delete;
+  ElementStore& operator=(const ElementStore&) = delete;
+  ~ElementStore();
+
+  // Adds an element whose block is `block` and returns its index. Throws
+  // std::bad_alloc when there is no memory for it.
+  size_t Add(const char* block);
+  size_t size() const { return size_; }
+  Element& operator[](size_t index) { return elements_[index]; }
+  const Element& operator[](size_t index) const { return elements_[index]; }
+
+ private:
+  Element* elements_ = nullptr;
+  size_t size_ = 0;
+  size_t capacity_ = 0;
 };
 
 // A rewrite of one attribute value: when `value` changes, fills `rewritten`
@@ -114,7 +154,7 @@ class Document {
   Document(const Document&) = delete;
   Document& operator=(const Document&) = delete;
 
-  const Element& root() const { return *root_; }
+  const Element& root() const { return elements_[0]; }
 
   // Applies `rewrite` to every attribute value of every element; a rewritten
   // value replaces the old one. Values read before may be changed in place.
@@ -125,15 +165,14 @@ class Document {
 
  private:
   friend class Parser;
-  Element* NewElement(const char* block);
+
   // Places a finished block of `size` bytes at `*out` in the text when it
   // ends by `limit`, else in the block arena; returns where it now stands.
   char* PlaceBlock(std::string_view block, char*& out, const char* limit);
 
   TextBuffer text_;  // the document as UTF-8, then its blocks
-  Arena elements_;
+  ElementStore elements_;
   Arena blocks_;  // blocks that did not fit in the text
-  Element* root_ = nullptr;
 };
 
 }  // namespace zor2::xml

@@ -199,10 +199,12 @@ class Parser {
   char* end_ = nullptr;  // *end_ is the zero sentinel
   bool first_window_ = true;
   char* p_ = nullptr;
-  // An element whose end tag is to come.
+  // An element whose end tag is to come, by its index (elements move as the
+  // store grows).
+  static constexpr size_t kNone = static_cast<size_t>(-1);
   struct Open {
-    Element* element;
-    Element* last_child;
+    size_t element;
+    size_t last_child;  // kNone before the first child
   };
   std::vector<Open> open_;
   bool root_seen_ = false;
@@ -219,7 +221,7 @@ class Parser {
   const char* fault_ = nullptr;
   std::string reason_;
   // The elements of the window, whose blocks are still where they were read.
-  std::vector<Element*> fresh_;
+  std::vector<size_t> fresh_;
   char* out_;  // where the next compact block goes
   std::string block_;
   std::string rewritten_;
@@ -255,7 +257,8 @@ bool Parser::ParseWindow(char* begin, char* end, bool more) {
   if (!more) {
     if (!open_.empty()) {
       return Fail(end_, "unexpected end of document, element <" +
-                            std::string(open_.back().element->tag()) + "> is not closed");
+                            std::string(document_.elements_[open_.back().element].tag()) +
+                            "> is not closed");
     }
     if (!root_seen_) return Fail(end_, begin_ == end_ ? "empty document" : "no root element");
   }
@@ -266,11 +269,11 @@ bool Parser::ParseWindow(char* begin, char* end, bool more) {
 void Parser::CompactBlocks(const char* limit) {
   const ReadPreparation& prep = preparation_;
   for (size_t i = 0; i < fresh_.size(); ++i) {
-    Element& element = *fresh_[i];
+    Element& element = document_.elements_[fresh_[i]];
     // The block as the window left it: the tag, then each attribute as
     //   separators name \0 [blanks] [=] [blanks] quote value \0
     // and ">" or "/".
-    const char* p = element.block_;
+    const char* p = element.block();
     const size_t tag_size = std::strlen(p) + 1;
     block_.assign(p, tag_size);
     kept_.clear();
@@ -298,9 +301,10 @@ void Parser::CompactBlocks(const char* limit) {
     }
     block_.push_back(kBlockEnd);
     // Up to where the next block of the window begins, or the text after it.
-    const char* block_limit = i + 1 < fresh_.size() ? fresh_[i + 1]->block_ : limit;
+    const char* block_limit =
+        i + 1 < fresh_.size() ? document_.elements_[fresh_[i + 1]].block() : limit;
     char* const place = document_.PlaceBlock(block_, out_, block_limit);
-    element.block_ = place;
+    element.set_block(place);
     for (const Kept& k : kept_) {
       prep.originals->Add(place + k.offset, k.original, place + block_.size() == out_);
     }
@@ -332,17 +336,17 @@ bool Parser::ParseStartTag(char* lt) {
   size_t length = name_end - name;
   std::memmove(lt, name, length);
   lt[length] = '\0';
-  Element* element = document_.NewElement(lt);
+  const size_t element = document_.elements_.Add(lt);
   fresh_.push_back(element);
   if (!root_seen_) {
     root_seen_ = true;
-    document_.root_ = element;
   } else {
     Open& parent = open_.back();
-    if (parent.last_child != nullptr) {
-      parent.last_child->next_ = element;
+    ElementStore& elements = document_.elements_;
+    if (parent.last_child != kNone) {
+      elements[parent.last_child].links_ |= static_cast<uint32_t>(element - parent.last_child) << 1;
     } else {
-      parent.element->first_child_ = element;
+      elements[parent.element].links_ |= 1;  // its first child follows it
     }
     parent.last_child = element;
   }
@@ -358,7 +362,7 @@ bool Parser::ParseStartTag(char* lt) {
     p_ = SkipSpace(p_);
     if (*p_ == '>') {
       ++p_;
-      open_.push_back({element, nullptr});
+      open_.push_back({element, kNone});
       return true;
     }
     if (*p_ == '/') {
@@ -494,7 +498,7 @@ bool Parser::ParseEndTag(char* lt) {
     return Fail(lt,
                 root_closed_ ? "end tag after the root element" : "end tag without a start tag");
   }
-  const char* tag = open_.back().element->tag();
+  const char* tag = document_.elements_[open_.back().element].tag();
   const char* expected = tag;
   char* p = name;
   while (*expected != '\0' && *expected == *p) {
