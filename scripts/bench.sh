@@ -87,46 +87,17 @@ inputs() {
   fi
 }
 
-# measure NAME: runs zor2check $runs times on the pair NAME and sets seconds (median wall time),
-# peak_kb (largest peak resident set), ref_bytes and bytes (reference side, both sides) and
-# report_bytes, then checks the digest of the report.
-measure() {
-  local name=$1 dir=$work/$1 times=() start end kb
-  local ref chk
-  read -r ref chk <<<"$(inputs "$name")"
-  peak_kb=0
-  log "running zor2check on $name, $runs times"
-  for ((i = 0; i < runs; i++)); do
-    start=$(date +%s%N)
-    if ! /usr/bin/time -f %M -o "$dir/time.txt" "$zor2check" -r "$ref" -c "$chk" \
-      -o "$dir/report.xml" -L -level M4R20 >"$dir/stdout.txt" 2>"$dir/stderr.txt"; then
-      log "zor2check failed on $name (see $dir/stderr.txt)"
-      status=1
-      seconds=failed peak_kb=0 report_bytes=0
-      return 0
-    fi
-    end=$(date +%s%N)
-    times+=("$(calc %.4f "$((end - start)) / 1e9")")
-    kb=$(tail -n 1 "$dir/time.txt")
-    ((kb > peak_kb)) && peak_kb=$kb
-  done
-  seconds=$(median "${times[@]}")
-  ref_bytes=$(du -bc "$ref" | tail -n 1 | cut -f 1)
-  bytes=$(du -bc "$ref" "$chk" | tail -n 1 | cut -f 1)
-  report_bytes=$(stat -c %s "$dir/report.xml")
-  digest=$(sha256sum "$dir/report.xml" | cut -d ' ' -f 1)
-  check_digest "$name" "$digest"
-}
-
-# measure_paired NAME: runs zor2check and the yardstick in turn, $runs times each, on the pair
-# NAME; sets what measure sets, yard_seconds (median of the yardstick's own times) and ratio (the
+# measure NAME [floor]: runs zor2check $runs times on the pair NAME and sets seconds (median wall
+# time), peak_kb (largest peak resident set), ref_bytes and bytes (reference side, both sides) and
+# report_bytes, then checks the digest of the report. With "floor", runs the yardstick after each
+# run of zor2check, and sets yard_seconds (median of the yardstick's own times) and ratio (the
 # median of the ratios of each pair of runs).
-measure_paired() {
-  local name=$1 dir=$work/$1 times=() yards=() ratios=() start end kb out t
+measure() {
+  local name=$1 floor=${2:-} dir=$work/$1 times=() yards=() ratios=() start end kb out t
   local ref chk
   read -r ref chk <<<"$(inputs "$name")"
   peak_kb=0
-  log "running zor2check and the yardstick in turn on $name, $runs times each"
+  log "running zor2check${floor:+ and the yardstick in turn} on $name, $runs times"
   for ((i = 0; i < runs; i++)); do
     start=$(date +%s%N)
     if ! /usr/bin/time -f %M -o "$dir/time.txt" "$zor2check" -r "$ref" -c "$chk" \
@@ -138,21 +109,24 @@ measure_paired() {
     fi
     end=$(date +%s%N)
     t=$(calc %.4f "$((end - start)) / 1e9")
+    times+=("$t")
+    kb=$(tail -n 1 "$dir/time.txt")
+    ((kb > peak_kb)) && peak_kb=$kb
+    [ -n "$floor" ] || continue
     if ! out=$("$yardstick" "$ref" "$chk"); then
       log "the yardstick failed on $name"
       status=1
       yard_seconds=failed
       return 0
     fi
-    times+=("$t")
     yards+=("${out%% *}")
     ratios+=("$(calc %.4f "$t / ${out%% *}")")
-    kb=$(tail -n 1 "$dir/time.txt")
-    ((kb > peak_kb)) && peak_kb=$kb
   done
   seconds=$(median "${times[@]}")
-  yard_seconds=$(median "${yards[@]}")
-  ratio=$(median "${ratios[@]}")
+  if [ -n "$floor" ]; then
+    yard_seconds=$(median "${yards[@]}")
+    ratio=$(median "${ratios[@]}")
+  fi
   ref_bytes=$(du -bc "$ref" | tail -n 1 | cut -f 1)
   bytes=$(du -bc "$ref" "$chk" | tail -n 1 | cut -f 1)
   report_bytes=$(stat -c %s "$dir/report.xml")
@@ -223,7 +197,7 @@ for layout in single directory; do
     name=$layout-${size}MB-s$seed
     generate "$name" --layout "$layout" --size "$size"
     if [ "$size" = "$mb" ]; then
-      measure_paired "$name"
+      measure "$name" floor
       changes=$(grep '^changes:' "$work/$name/generated.txt")
       add_row "$layout"
     else
