@@ -19,11 +19,15 @@ bool IsUsable(CXCursor member) {
          clang_getCXXAccessSpecifier(member) != CX_CXXPrivate;
 }
 
-// The class definition that `type` names, or a null cursor.
+// The class definition that `type` names, or a null cursor. A template's
+// implicit instantiation shows none of its members: its template's stand in.
 CXCursor DefinitionOf(CXType type) {
   const CXCursor declaration = clang_getTypeDeclaration(clang_getCanonicalType(type));
   if (clang_Cursor_isNull(declaration)) return declaration;
-  return clang_getCursorDefinition(declaration);
+  const CXCursor definition = clang_getCursorDefinition(declaration);
+  if (clang_Cursor_isNull(definition) || !ChildrenOf(definition).empty()) return definition;
+  const CXCursor pattern = clang_getSpecializedCursorTemplate(definition);
+  return clang_Cursor_isNull(pattern) ? definition : pattern;
 }
 
 // The class's own name, without template arguments.
@@ -188,25 +192,38 @@ const DeclaredMembers& ClassFacts::Declared(CXCursor definition) {
   return declared_.emplace(std::move(usr), ReadDeclaredMembers(definition)).first->second;
 }
 
-void ClassFacts::AddClassObstacles(CXCursor definition, Obstacles* obstacles) {
+void ClassFacts::AddClassObstacles(CXCursor definition, int depth, Obstacles* obstacles) {
   if (clang_Cursor_isNull(definition)) return;
   const DeclaredMembers& declared = Declared(definition);
-  if (declared.any_constructor && !declared.usable_default_constructor) {
+  // What the class does not declare, the compiler declares for it, unless
+  // its own members and bases stand in the way; past a few levels of members
+  // of members, they are taken to be usable.
+  Obstacles own;
+  if (depth < 8) own = ObstaclesOf(definition, depth + 1);
+  const bool moves = declared.move_constructor || declared.move_assignment;
+  if (declared.any_constructor ? !declared.usable_default_constructor : own.default_constructor) {
     obstacles->default_constructor = true;
   }
-  if ((declared.copy_constructor && !declared.usable_copy_constructor) ||
-      (!declared.copy_constructor && (declared.move_constructor || declared.move_assignment))) {
+  if (declared.copy_constructor ? !declared.usable_copy_constructor
+                                : moves || own.copy_constructor) {
     obstacles->copy_constructor = true;
   }
-  if ((declared.copy_assignment && !declared.usable_copy_assignment) ||
-      (!declared.copy_assignment && (declared.move_constructor || declared.move_assignment))) {
+  if (declared.copy_assignment ? !declared.usable_copy_assignment : moves || own.copy_assignment) {
     obstacles->copy_assignment = true;
   }
 }
 
-ClassFacts::Obstacles ClassFacts::FindObstacles(CXCursor definition) {
+const ClassFacts::Obstacles& ClassFacts::ObstaclesOf(CXCursor definition, int depth) {
+  std::string usr = Take(clang_getCursorUSR(definition));
+  const auto found = obstacles_.find(usr);
+  if (found != obstacles_.end()) return found->second;
+  Obstacles obstacles = FindObstacles(definition, depth);
+  return obstacles_.emplace(std::move(usr), obstacles).first->second;
+}
+
+ClassFacts::Obstacles ClassFacts::FindObstacles(CXCursor definition, int depth) {
   Obstacles obstacles;
-  for (CXCursor base : BasesOf(definition)) AddClassObstacles(base, &obstacles);
+  for (CXCursor base : BasesOf(definition)) AddClassObstacles(base, depth, &obstacles);
   for (CXCursor child : ChildrenOf(definition)) {
     if (clang_getCursorKind(child) != CXCursor_FieldDecl) continue;
     const CXType type = clang_getCanonicalType(clang_getCursorType(child));
@@ -227,7 +244,7 @@ ClassFacts::Obstacles ClassFacts::FindObstacles(CXCursor definition) {
     }
     if (!clang_Cursor_isNull(member_class) && IsClassKind(clang_getCursorKind(member_class))) {
       Obstacles of_member;
-      AddClassObstacles(member_class, &of_member);
+      AddClassObstacles(member_class, depth, &of_member);
       if (initialized) of_member.default_constructor = false;
       obstacles.default_constructor |= of_member.default_constructor;
       obstacles.copy_constructor |= of_member.copy_constructor;
@@ -254,7 +271,7 @@ MethodDescription ImplicitMember(std::string name, std::string signature) {
 void ClassFacts::AddImplicitMembers(CXCursor definition, const TemplateParameters& parameters,
                                     ClassDescription* described) {
   const DeclaredMembers& declared = Declared(definition);
-  const Obstacles obstacles = FindObstacles(definition);
+  const Obstacles& obstacles = ObstaclesOf(definition, 0);
   const std::string name = ShortName(definition);
   const SelfType self = SelfTypeOf(definition, parameters);
   const std::string& written = self.written;

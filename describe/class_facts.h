@@ -42,9 +42,9 @@ class ClassFacts {
   // assignment and destructor that the compiler declares for the class
   // `definition` and that are usable: those the class does not declare
   // itself, unless a declaration of its own, a member or a base suppresses or
-  // deletes them. Members and bases are looked at one level deep; what
-  // libclang cannot tell (a member whose type depends on a template
-  // parameter) counts as usable.
+  // deletes them. Members and bases are looked at, and their own members and
+  // bases, a few levels deep; what libclang cannot tell (a member whose type
+  // depends on a template parameter) counts as usable.
   void AddImplicitMembers(CXCursor definition, const TemplateParameters& parameters,
                           ClassDescription* described);
 
@@ -66,11 +66,16 @@ class ClassFacts {
   // Whether `definition` or a class it derives from, at any depth, declares a
   // virtual function (`destructor_only`: a virtual destructor).
   bool InheritsVirtual(CXCursor definition, bool destructor_only);
-  // A member or base of class type: what its own declarations deny.
-  void AddClassObstacles(CXCursor definition, Obstacles* obstacles);
-  Obstacles FindObstacles(CXCursor definition);
+  // A member or base of class type: what it denies, by its own declarations
+  // or, for what it leaves to the compiler, by its members and bases in turn
+  // (`depth` levels down so far).
+  void AddClassObstacles(CXCursor definition, int depth, Obstacles* obstacles);
+  // What the members and bases of the class `definition` deny, kept.
+  const Obstacles& ObstaclesOf(CXCursor definition, int depth);
+  Obstacles FindObstacles(CXCursor definition, int depth);
 
   std::map<std::string, DeclaredMembers> declared_;  // by USR
+  std::map<std::string, Obstacles> obstacles_;       // by USR
 };
 
 }  // namespace zor2::describe

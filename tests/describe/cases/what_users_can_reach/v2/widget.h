@@ -3,6 +3,8 @@
 // compiler's own default constructor stands for a written one.
 #pragma once
 
+#include <memory>
+
 namespace ui {
 
 class Widget {
@@ -23,6 +25,16 @@ class Widget {
 struct Options {
   explicit Options(int level);
   int level;
+};
+
+// Not copyable, for its member's member: saying so changes nothing.
+struct Inner {
+  std::unique_ptr<int> value;
+};
+struct Holder {
+  Holder() = default;
+  Holder(const Holder&) = delete;
+  Inner inner;
 };
 
 }  // namespace ui
