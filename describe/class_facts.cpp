@@ -2,6 +2,7 @@
 
 #include <set>
 #include <string>
+#include <utility>
 
 #include "describe/clang_handles.h"
 
@@ -156,7 +157,81 @@ std::vector<CXCursor> BasesOf(CXCursor definition) {
   return bases;
 }
 
+// The direct bases of `definition` with the access through which each is
+// inherited, those that depend on its template parameters left out.
+std::vector<std::pair<CXCursor, CX_CXXAccessSpecifier>> BasesWithAccess(CXCursor definition) {
+  std::vector<std::pair<CXCursor, CX_CXXAccessSpecifier>> bases;
+  for (CXCursor child : ChildrenOf(definition)) {
+    if (clang_getCursorKind(child) != CXCursor_CXXBaseSpecifier) continue;
+    if (IsDependent(clang_getCursorType(child))) continue;
+    const CXCursor base = DefinitionOf(clang_getCursorType(child));
+    if (!clang_Cursor_isNull(base)) bases.emplace_back(base, clang_getCXXAccessSpecifier(child));
+  }
+  return bases;
+}
+
+// The narrower of two accesses.
+CX_CXXAccessSpecifier Narrower(CX_CXXAccessSpecifier a, CX_CXXAccessSpecifier b) {
+  auto rank = [](CX_CXXAccessSpecifier access) {
+    return access == CX_CXXPrivate ? 2 : access == CX_CXXProtected ? 1 : 0;
+  };
+  return rank(a) >= rank(b) ? a : b;
+}
+
+// Adds to `covered` the functions that `method` overrides, at any depth.
+void CoverOverridden(CXCursor method, std::set<std::string>* covered) {
+  std::vector<CXCursor> pending = {method};
+  while (!pending.empty()) {
+    const CXCursor at = pending.back();
+    pending.pop_back();
+    CXCursor* overridden = nullptr;
+    unsigned count = 0;
+    clang_getOverriddenCursors(at, &overridden, &count);
+    for (unsigned i = 0; i < count; ++i) {
+      if (covered->insert(Take(clang_getCursorUSR(overridden[i]))).second) {
+        pending.push_back(overridden[i]);
+      }
+    }
+    clang_disposeOverriddenCursors(overridden);
+  }
+}
+
+bool IsVirtualMember(CXCursor cursor) {
+  const CXCursorKind kind = clang_getCursorKind(cursor);
+  return (kind == CXCursor_CXXMethod || kind == CXCursor_ConversionFunction) &&
+         clang_CXXMethod_isVirtual(cursor) != 0;
+}
+
 }  // namespace
+
+std::vector<InheritedVirtual> InheritedVirtuals(CXCursor definition) {
+  std::vector<InheritedVirtual> inherited;
+  std::set<std::string> covered;  // functions that a nearer class overrides
+  std::set<std::string> seen;     // classes walked
+  // Nearest first: the class itself, then its bases in order, then theirs.
+  std::vector<std::pair<CXCursor, CX_CXXAccessSpecifier>> level = {{definition, CX_CXXPublic}};
+  while (!level.empty()) {
+    std::vector<std::pair<CXCursor, CX_CXXAccessSpecifier>> next;
+    for (const auto& [at, path_access] : level) {
+      if (!seen.insert(Take(clang_getCursorUSR(at))).second) continue;
+      const bool own = clang_equalCursors(at, definition) != 0;
+      for (CXCursor member : ChildrenOf(at)) {
+        if (!IsVirtualMember(member)) continue;
+        const bool overridden = !covered.insert(Take(clang_getCursorUSR(member))).second;
+        CoverOverridden(member, &covered);
+        if (own || overridden) continue;
+        const CX_CXXAccessSpecifier access =
+            Narrower(clang_getCXXAccessSpecifier(member), path_access);
+        if (access != CX_CXXPrivate) inherited.push_back({member, access});
+      }
+      for (const auto& [base, base_access] : BasesWithAccess(at)) {
+        next.emplace_back(base, own ? base_access : Narrower(base_access, path_access));
+      }
+    }
+    level = std::move(next);
+  }
+  return inherited;
+}
 
 // The bases are walked with a list of their own, each once.
 bool ClassFacts::InheritsVirtual(CXCursor definition, bool destructor_only) {

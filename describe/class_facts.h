@@ -31,6 +31,19 @@ struct DeclaredMembers {
   bool virtual_destructor = false;
 };
 
+// A virtual function that a class inherits and does not override, with the
+// access it has in that class.
+struct InheritedVirtual {
+  CXCursor method;
+  CX_CXXAccessSpecifier access;
+};
+
+// The virtual functions that the class `definition` inherits without
+// overriding them, nearest bases first, each once: what stands in its
+// virtual table besides its own. Those a private base brings, or private in
+// their class, are left out.
+std::vector<InheritedVirtual> InheritedVirtuals(CXCursor definition);
+
 // What C++ says about the classes of one unit, beyond the members written in
 // them. What each class declares is read once and kept, so that a class used
 // as a member or a base of many others is read once.

@@ -61,6 +61,7 @@ void AddMethod(xml::OutputElement* parent, const MethodDescription& method) {
   SetOptional(element, "Deprecated", method.deprecated);
   SetLine(element, method.line);
   if (method.implicit) element->SetAttribute("Implicit", "Y");
+  if (method.inherited) element->SetAttribute("Inherited", "Y");
   for (const ArgDescription& arg : method.args) {
     xml::OutputElement* arg_element = element->AddChild("Arg");
     Set(arg_element, "Type", arg.type);

@@ -27,8 +27,9 @@ struct MethodDescription {
   bool nodoc = false;
   std::optional<std::string> deprecated;
   std::vector<ArgDescription> args;
-  unsigned line = 0;      // of the declaration; 0 for a member the compiler declares
-  bool implicit = false;  // declared by the compiler, not written in the header
+  unsigned line = 0;       // of the declaration; 0 for a member the compiler declares
+  bool implicit = false;   // declared by the compiler, not written in the header
+  bool inherited = false;  // a virtual function of a base that the class does not override
 };
 
 struct ClassDescription {

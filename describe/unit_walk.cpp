@@ -540,6 +540,21 @@ class UnitWalker {
                                  " names no argument of " + scope + "::" + method.name);
   }
 
+  // A virtual function that a class inherits without overriding it is part
+  // of its interface as much as an override: described among its methods, so
+  // that an override removed where the base keeps the function is no change.
+  void AddInheritedVirtuals(CXCursor definition, ClassDescription* described) {
+    for (const InheritedVirtual& base_function : InheritedVirtuals(definition)) {
+      std::optional<MethodDescription> method = DescribeMethod(
+          base_function.method, *described, true, TemplateParameters::Around(base_function.method));
+      if (!method) continue;
+      method->access = base_function.access == CX_CXXProtected ? "Protected" : "Public";
+      method->line = 0;
+      method->inherited = true;
+      described->methods.push_back(std::move(*method));
+    }
+  }
+
   // The free functions go last in their files, the members the compiler
   // declares last in their classes; untagged headers get their usage; and a
   // header that holds code but got nothing from the unit is to be compiled on
@@ -547,6 +562,7 @@ class UnitWalker {
   void FinishFiles() {
     for (const PendingClass& pending : implicit_pending_) {
       ClassDescription& described = outcome_->files[pending.header]->classes[pending.index];
+      AddInheritedVirtuals(pending.definition, &described);
       class_facts_.AddImplicitMembers(pending.definition, pending.parameters, &described);
     }
     for (size_t h = 0; h < headers_.headers.size(); ++h) {

@@ -35,4 +35,16 @@ struct Holder {
   Inner inner;
 };
 
+// An override removed where the base keeps the function: the sink's
+// interface is the same.
+class Output {
+ public:
+  virtual ~Output();
+  virtual void Flush();
+};
+class Sink : public Output {
+ public:
+  void Flush() override;
+};
+
 }  // namespace ui
