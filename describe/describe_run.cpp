@@ -28,11 +28,6 @@ unsigned MachineThreads() {
   return cores == 0 ? 1 : cores;
 }
 
-std::string IncludePath(const std::string& dir, const std::string& header) {
-  if (dir.empty()) return header;
-  return dir.back() == '/' ? dir + header : dir + "/" + header;
-}
-
 // The described header that the output `output` would replace (the same file,
 // or, while the output does not exist yet, the same place), or nothing.
 std::optional<std::string> OutputClash(const std::string& output,
@@ -46,7 +41,7 @@ std::optional<std::string> OutputClash(const std::string& output,
   const fs::path place = fs::weakly_canonical(output, code);
   for (const GroupInput& input : inputs) {
     for (const std::string& header : input.headers) {
-      const std::string path = IncludePath(input.dir, header);
+      const std::string path = HeaderPath(input.dir, header);
       struct stat header_status;
       if (::stat(path.c_str(), &header_status) != 0) continue;
       const bool same = exists ? header_status.st_dev == output_status.st_dev &&

@@ -12,6 +12,7 @@
 #include <utility>
 
 #include "describe/clang_handles.h"
+#include "describe/header_listing.h"
 #include "describe/include_order.h"
 #include "platform/tools/background.h"
 
@@ -22,11 +23,6 @@ namespace {
 // it in the working directory, against which the header paths are resolved
 // as given.
 constexpr char kMainName[] = "zor2describe-headers.cpp";
-
-std::string IncludePath(const std::string& dir, const std::string& header) {
-  if (dir.empty()) return header;
-  return dir.back() == '/' ? dir + header : dir + "/" + header;
-}
 
 std::vector<std::string> CompilerArguments(const CompileSettings& settings, bool header_language) {
   // No error limit: clang's "too many errors" belongs to no header and would
@@ -128,7 +124,7 @@ UnitOutcome DescribeUnit(const std::string& dir, const std::vector<std::string>&
   std::string main_text;
   bool any_refused = false;
   for (size_t h : IncludeOrder(dir, headers, settings.roots)) {
-    const std::string path = IncludePath(dir, headers[h]);
+    const std::string path = HeaderPath(dir, headers[h]);
     if (path.find_first_of("\"\n") != std::string::npos) {
       refused.diagnostics[h].push_back(path +
                                        ": a path holding a quote or a line end cannot be "
@@ -140,7 +136,7 @@ UnitOutcome DescribeUnit(const std::string& dir, const std::vector<std::string>&
   }
   const bool solo = headers.size() == 1;
   if (solo && any_refused) return refused;
-  const std::string solo_path = solo ? IncludePath(dir, headers[0]) : "";
+  const std::string solo_path = solo ? HeaderPath(dir, headers[0]) : "";
 
   std::vector<std::string> arguments = CompilerArguments(settings, false);
   if (!preamble.empty()) {
@@ -161,7 +157,7 @@ UnitOutcome DescribeUnit(const std::string& dir, const std::vector<std::string>&
   UnitHandle unit(raw_unit);
   if (code != CXError_Success || unit == nullptr) {
     for (size_t h = 0; h < headers.size(); ++h) {
-      refused.diagnostics[h].push_back(IncludePath(dir, headers[h]) +
+      refused.diagnostics[h].push_back(HeaderPath(dir, headers[h]) +
                                        ": libclang could not parse it (error " +
                                        std::to_string(static_cast<int>(code)) + ")");
     }

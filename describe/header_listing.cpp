@@ -6,6 +6,11 @@
 
 namespace zor2::describe {
 
+std::string HeaderPath(const std::string& dir, const std::string& name) {
+  if (dir.empty()) return name;
+  return dir.back() == '/' ? dir + name : dir + "/" + name;
+}
+
 bool IsHeaderName(const std::string& name) {
   for (const char* extension : {".h", ".hh", ".hpp", ".hxx", ".h++"}) {
     const std::string_view end(extension);

@@ -5,6 +5,10 @@
 
 namespace zor2::describe {
 
+// The path of the header `name` (relative to `dir`) as it is opened: `dir`
+// and `name` joined with one '/', or `name` alone when `dir` is empty.
+std::string HeaderPath(const std::string& dir, const std::string& name);
+
 // Whether `name` ends like a C++ header: .h, .hh, .hpp, .hxx or .h++.
 bool IsHeaderName(const std::string& name);
 

@@ -7,13 +7,11 @@
 #include <sstream>
 #include <string_view>
 
+#include "describe/header_listing.h"
+#include "describe/source_scan.h"
+
 namespace zor2::describe {
 namespace {
-
-std::string Joined(const std::string& dir, const std::string& name) {
-  if (dir.empty()) return name;
-  return dir.back() == '/' ? dir + name : dir + "/" + name;
-}
 
 std::string FileText(const std::string& path) {
   std::ifstream in(path, std::ios::binary);
@@ -39,54 +37,25 @@ std::string Normal(const std::string& path) {
 
 std::vector<std::string> IncludedNames(std::string_view source) {
   std::vector<std::string> names;
-  size_t pos = 0;
-  bool line_start = true;
-  while (pos < source.size()) {
-    const char c = source[pos];
-    if (c == '\n') {
-      line_start = true;
-      ++pos;
-    } else if (c == ' ' || c == '\t' || c == '\r') {
-      ++pos;
-    } else if (source.compare(pos, 2, "//") == 0) {
-      while (pos < source.size() && source[pos] != '\n') ++pos;
-    } else if (source.compare(pos, 2, "/*") == 0) {
-      const size_t end = source.find("*/", pos + 2);
-      pos = end == std::string_view::npos ? source.size() : end + 2;
-    } else if (c == '#' && line_start) {
-      size_t at = pos + 1;
-      while (at < source.size() && (source[at] == ' ' || source[at] == '\t')) ++at;
-      if (source.compare(at, 7, "include") == 0 && source.compare(at, 12, "include_next") != 0) {
-        at += 7;
-        while (at < source.size() && (source[at] == ' ' || source[at] == '\t')) ++at;
-        const char close = at < source.size() && source[at] == '<' ? '>' : '"';
-        if (at < source.size() && (source[at] == '<' || source[at] == '"')) {
-          const size_t end = source.find_first_of(std::string{close, '\n'}, at + 1);
-          if (end != std::string_view::npos && source[end] == close) {
-            names.emplace_back(source.substr(at + 1, end - at - 1));
-          }
-        }
-      }
-      while (pos < source.size() && source[pos] != '\n') ++pos;
-    } else {
-      line_start = false;
-      ++pos;
-    }
-  }
+  ScanDirectives(source, [&names](std::string_view directive) {
+    const std::string target = IncludeTarget(directive);
+    if (!target.empty()) names.push_back(target.substr(1, target.size() - 2));
+  });
   return names;
 }
 
 std::vector<size_t> IncludeOrder(const std::string& dir, const std::vector<std::string>& headers,
                                  const std::vector<std::string>& roots) {
   std::map<std::string, size_t> index_of_path;
-  for (size_t h = 0; h < headers.size(); ++h) index_of_path[Normal(Joined(dir, headers[h]))] = h;
+  for (size_t h = 0; h < headers.size(); ++h)
+    index_of_path[Normal(HeaderPath(dir, headers[h]))] = h;
   std::vector<bool> included(headers.size(), false);
   for (size_t h = 0; h < headers.size(); ++h) {
-    const std::string path = Joined(dir, headers[h]);
+    const std::string path = HeaderPath(dir, headers[h]);
     const std::string beside = std::filesystem::path(path).parent_path().string();
     for (const std::string& name : IncludedNames(FileText(path))) {
-      std::vector<std::string> places = {Joined(beside, name)};
-      for (const std::string& root : roots) places.push_back(Joined(root, name));
+      std::vector<std::string> places = {HeaderPath(beside, name)};
+      for (const std::string& root : roots) places.push_back(HeaderPath(root, name));
       for (const std::string& place : places) {
         const auto found = index_of_path.find(Normal(place));
         if (found != index_of_path.end() && found->second != h) {

@@ -12,6 +12,8 @@
 #include "describe/class_facts.h"
 #include "describe/comment_tags.h"
 #include "describe/declaration_text.h"
+#include "describe/header_listing.h"
+#include "describe/source_scan.h"
 #include "describe/type_spelling.h"
 
 namespace zor2::describe {
@@ -109,11 +111,6 @@ std::string AccessOf(CXCursor cursor) {
   }
 }
 
-std::string IncludePath(const std::string& dir, const std::string& header) {
-  if (dir.empty()) return header;
-  return dir.back() == '/' ? dir + header : dir + "/" + header;
-}
-
 // The error diagnostic and its notes, as clang writes them, less the notes
 // that point into the made-up main file ("in file included from").
 std::vector<std::string> FormatDiagnostic(CXDiagnostic diagnostic, const std::string& main_name) {
@@ -130,71 +127,6 @@ std::vector<std::string> FormatDiagnostic(CXDiagnostic diagnostic, const std::st
     clang_disposeDiagnostic(note);
   }
   return lines;
-}
-
-// Whether the C++ text `source` holds anything but comments and preprocessor
-// directives, that is, declares something of its own.
-bool HoldsCode(std::string_view source) {
-  size_t pos = 0;
-  bool line_start = true;
-  while (pos < source.size()) {
-    const char c = source[pos];
-    if (c == '\n') {
-      line_start = true;
-      ++pos;
-    } else if (c == ' ' || c == '\t' || c == '\r' || c == '\f' || c == '\v') {
-      ++pos;
-    } else if (source.compare(pos, 2, "//") == 0) {
-      while (pos < source.size() && source[pos] != '\n') ++pos;
-    } else if (source.compare(pos, 2, "/*") == 0) {
-      const size_t end = source.find("*/", pos + 2);
-      pos = end == std::string_view::npos ? source.size() : end + 2;
-    } else if (c == '#' && line_start) {
-      // A directive runs to the end of its line, continued lines included.
-      while (pos < source.size() && source[pos] != '\n') {
-        pos += source[pos] == '\\' && pos + 1 < source.size() ? 2 : 1;
-      }
-    } else {
-      return true;
-    }
-  }
-  return false;
-}
-
-// The target of the #include directive on the line of `location`, as written
-// ("<vector>", "\"dep/x.h\""); empty for anything else (#include_next, a
-// macro).
-std::string IncludeDirectiveTarget(CXTranslationUnit unit, CXSourceLocation location) {
-  CXFile file = nullptr;
-  unsigned line = 0;
-  clang_getSpellingLocation(location, &file, &line, nullptr, nullptr);
-  if (file == nullptr) return "";
-  size_t size = 0;
-  const char* text = clang_getFileContents(unit, file, &size);
-  if (text == nullptr) return "";
-  unsigned offset = 0;
-  clang_getSpellingLocation(clang_getLocation(unit, file, line, 1), nullptr, nullptr, nullptr,
-                            &offset);
-  const std::string_view source(text, size);
-  const size_t end = std::min(source.find('\n', offset), source.size());
-  std::string_view directive = source.substr(offset, end - offset);
-  const size_t hash = directive.find('#');
-  if (hash == std::string_view::npos) return "";
-  directive.remove_prefix(hash + 1);
-  while (!directive.empty() && (directive.front() == ' ' || directive.front() == '\t')) {
-    directive.remove_prefix(1);
-  }
-  if (directive.substr(0, 7) != "include" || directive.substr(0, 12) == "include_next") return "";
-  directive.remove_prefix(7);
-  while (!directive.empty() && (directive.front() == ' ' || directive.front() == '\t')) {
-    directive.remove_prefix(1);
-  }
-  if (directive.empty()) return "";
-  const char close = directive.front() == '<' ? '>' : directive.front() == '"' ? '"' : 0;
-  if (close == 0) return "";
-  const size_t closing = directive.find(close, 1);
-  if (closing == std::string_view::npos) return "";
-  return std::string(directive.substr(0, closing + 1));
 }
 
 std::string Canonical(const std::string& path) {
@@ -260,7 +192,7 @@ class UnitWalker {
 
   void IndexHeaders() {
     for (size_t h = 0; h < headers_.headers.size(); ++h) {
-      const std::string path = IncludePath(headers_.dir, headers_.headers[h]);
+      const std::string path = HeaderPath(headers_.dir, headers_.headers[h]);
       CXFile file = clang_getFile(unit_, path.c_str());
       files_.push_back(file);
       if (std::optional<FileKey> key = KeyOf(file)) {
@@ -291,7 +223,10 @@ class UnitWalker {
     const int includer = HeaderOfFile(ExpansionFile(stack[0]));
     NoteStandIn(name, path, includer >= 0);
     if (includer < 0) return;
-    std::string target = IncludeDirectiveTarget(unit_, stack[0]);
+    CXFile includer_file = nullptr;
+    unsigned offset = 0;
+    clang_getFileLocation(stack[0], &includer_file, nullptr, nullptr, &offset);
+    std::string target = IncludeTarget(DirectiveAt(texts_.Of(includer_file), offset));
     if (!target.empty() && outside_seen_.insert(target).second) {
       outcome_->outside_includes.push_back(std::move(target));
     }
@@ -309,7 +244,7 @@ class UnitWalker {
       // include of it says that it was meant.
       if (tail.find('/') == std::string::npos && !included_by_described) continue;
       outcome_->stand_ins.push_back(name + " was read in place of " +
-                                    IncludePath(headers_.dir, headers_.headers[found->second]));
+                                    HeaderPath(headers_.dir, headers_.headers[found->second]));
       return;
     }
   }
@@ -366,12 +301,7 @@ class UnitWalker {
     }
   }
 
-  std::string_view TextOf(size_t h) const {
-    size_t size = 0;
-    const char* text =
-        files_[h] != nullptr ? clang_getFileContents(unit_, files_[h], &size) : nullptr;
-    return text != nullptr ? std::string_view(text, size) : std::string_view();
-  }
+  std::string_view TextOf(size_t h) { return texts_.Of(files_[h]); }
 
   // The walk keeps its own stack of open scopes, so that the nesting of the
   // headers never bounds it.
@@ -573,7 +503,7 @@ class UnitWalker {
       }
       if (!file.usage) file.usage = derivable_[h] ? "U2" : "U1";
       if (declares_.count(static_cast<int>(h)) == 0 &&
-          (files_[h] == nullptr || HoldsCode(TextOf(h)))) {
+          (files_[h] == nullptr || ScanDirectives(TextOf(h)))) {
         outcome_->needs_own_unit[h] = true;
       }
     }
