@@ -204,7 +204,9 @@ GroupOutcome DescribeGroup(const GroupInput& input, const CompileSettings& setti
   GroupOutcome outcome;
   outcome.group.name = input.name;
   if (input.headers.empty()) return outcome;
+  progress->AddWork(1);
   UnitOutcome whole = DescribeUnit(input.dir, input.headers, settings, "");
+  progress->Advance();
 
   // The headers to compile on their own: all of them when an error could not
   // be charged to one, else those the unit left empty.

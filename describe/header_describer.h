@@ -51,7 +51,7 @@ struct GroupOutcome {
 // elsewhere has been compiled once into a precompiled header; so is a header
 // that the unit left empty though it declares something (its include guard
 // was taken, or it was reached under another name). `progress` counts the
-// headers compiled one by one.
+// translation units compiled.
 GroupOutcome DescribeGroup(const GroupInput& input, const CompileSettings& settings,
                            unsigned threads, ProgressLine* progress);
 
