@@ -156,9 +156,9 @@ void CheckMandatoryOptions(OptionScan* scan) {
 }
 
 void AnnounceRun(const RunConfiguration& config, Log& log) {
-  log.Progress() << "## Ref : " << PrintablePath(config.reference_path);
-  log.Progress() << "## Checked : " << PrintablePath(config.checked_path);
-  log.Progress() << "## Output : " << PrintablePath(config.output_path);
+  log.Progress() << "## Ref : " << config.reference_path;
+  log.Progress() << "## Checked : " << config.checked_path;
+  log.Progress() << "## Output : " << config.output_path;
 }
 
 void FixLevel(const std::optional<std::string>& level_text, CheckSettings* settings, Log& log) {

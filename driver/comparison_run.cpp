@@ -86,7 +86,7 @@ class ComparisonRun {
   // Names `path` and why it failed in an "ERROR: " line; the run's result is
   // then incomplete. Every failure of a run is reported here.
   void ReportFailure(const std::string& path, const std::string& reason) {
-    log_.Warning() << "ERROR: " << PrintablePath(path) << ": " << reason;
+    log_.Warning() << "ERROR: " << path << ": " << reason;
     incomplete_ = true;
   }
 
@@ -269,7 +269,7 @@ class ComparisonRun {
     std::string err;
     if (WriteFileAtomically(path, HelpPageText(), &opened, &err)) return;
     // The page's long-standing line comes first when it cannot even be opened.
-    if (!opened) log_.Warning() << "Unable to open file " << PrintablePath(path);
+    if (!opened) log_.Warning() << "Unable to open file " << path;
     ReportFailure(path, err);
   }
 
