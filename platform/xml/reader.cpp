@@ -1,23 +1,16 @@
 #include "platform/xml/reader.h"
 
-#include <fcntl.h>
 #include <strings.h>
-#include <sys/resource.h>
-#include <sys/stat.h>
-#include <sys/sysinfo.h>
-#include <unistd.h>
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
 #include <cstdint>
 #include <cstring>
-#include <limits>
 #include <string>
 #include <unordered_set>
 #include <vector>
 
-#include "platform/tools/file_descriptor.h"
+#include "platform/tools/file_input.h"
 #include "platform/xml/text_encoding.h"
 #include "platform/xml/xml_characters.h"
 
@@ -504,66 +497,21 @@ bool Parser::ParseProcessingInstruction(char* lt) {
 
 namespace {
 
-bool Refuse(ReadError* err, int error_number) {
-  err->reason = std::strerror(error_number);
-  return false;
-}
-
-// The most memory the process could ever hold: the machine's memory and swap,
-// or less when the process is limited.
-uintmax_t MemoryLimit() {
-  uintmax_t limit = std::numeric_limits<uintmax_t>::max();
-  struct sysinfo machine;
-  if (::sysinfo(&machine) == 0) {
-    limit = (uintmax_t{machine.totalram} + machine.totalswap) * machine.mem_unit;
-  }
-  for (int resource : {RLIMIT_AS, RLIMIT_DATA}) {
-    struct rlimit process;
-    if (::getrlimit(resource, &process) == 0 && process.rlim_cur != RLIM_INFINITY) {
-      limit = std::min<uintmax_t>(limit, process.rlim_cur);
-    }
-  }
-  return limit;
-}
-
 // Reads the regular file at `path` in one piece into `text`, with spare
-// capacity after it for values that preparation makes longer. It is opened
-// without blocking, since a named pipe (or a device) may stand where a regular
-// file was seen a moment before; only a regular file is read.
+// capacity after it for values that preparation makes longer.
 bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
-  FileDescriptor file(::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
-  if (!file.valid()) return Refuse(err, errno);
-  struct stat status;
-  if (::fstat(file.get(), &status) != 0) return Refuse(err, errno);
-  if (S_ISDIR(status.st_mode)) return Refuse(err, EISDIR);
-  if (!S_ISREG(status.st_mode)) {
-    err->reason = "Not a regular file";
-    return false;
-  }
-  // A document that could never be held is refused before any of it is read.
-  if (static_cast<uintmax_t>(status.st_size) >= MemoryLimit()) {
-    err->reason = kNotEnoughMemory;
-    return false;
-  }
-  // One byte more than the file's size, so that its end is seen without
-  // growing the buffer (it grows should the file grow meanwhile).
-  size_t limit = static_cast<size_t>(status.st_size) + 1;
-  TextBuffer buffer = TextBuffer::Allocate(limit, limit / 4);
+  TextBuffer buffer;
+  const ReadRoom room = [&buffer](size_t size, size_t kept) {
+    TextBuffer larger = TextBuffer::Allocate(size, size / 4);
+    if (kept > 0) std::memcpy(larger.data(), buffer.data(), kept);
+    buffer = std::move(larger);
+    return buffer.data();
+  };
   size_t length = 0;
-  for (;;) {
-    if (length == limit) {
-      limit *= 2;
-      TextBuffer larger = TextBuffer::Allocate(limit, limit / 4);
-      std::memcpy(larger.data(), buffer.data(), length);
-      buffer = std::move(larger);
-    }
-    ssize_t got = ::read(file.get(), buffer.data() + length, limit - length);
-    if (got < 0) {
-      if (errno == EINTR) continue;
-      return Refuse(err, errno);
-    }
-    if (got == 0) break;
-    length += static_cast<size_t>(got);
+  FileReadError error;
+  if (!ReadRegularFile(path, room, &length, &error)) {
+    err->reason = error.too_large ? kNotEnoughMemory : std::move(error.reason);
+    return false;
   }
   buffer.size = length;
   buffer.bytes[length] = '\0';
