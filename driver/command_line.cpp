@@ -51,14 +51,18 @@ struct OptionScan {
   bool failed = false;
 };
 
-// Fills `items` from the argument file (the arguments "=" and a path) or else
-// from the arguments themselves. False when the argument file cannot be read.
+// Fills `items` from the argument file (the arguments "=" and a path), whose
+// path then goes to `argument_file`, or else from the arguments themselves.
+// False when the argument file cannot be read.
 bool CollectItems(int argc, const char* const* argv, std::string_view program,
-                  std::vector<std::string>* items) {
+                  std::vector<std::string>* items, std::optional<std::string>* argument_file) {
   std::string err;
-  if (argc == 3 && std::strcmp(argv[1], "=") == 0 && !ReadArgumentFile(argv[2], items, &err)) {
-    WriteLine(stderr, {program, ": unable to read file ", PrintablePath(argv[2])});
-    return false;
+  if (argc == 3 && std::strcmp(argv[1], "=") == 0) {
+    if (!ReadArgumentFile(argv[2], items, &err)) {
+      WriteLine(stderr, {program, ": unable to read file ", PrintablePath(argv[2])});
+      return false;
+    }
+    if (!items->empty()) *argument_file = argv[2];
   }
   // An argument file without any item counts as no argument file.
   if (items->empty()) {
@@ -185,7 +189,9 @@ std::optional<ExitStatus> ReadCommandLine(int argc, const char* const* argv,
   scan.program = argc > 0 && argv[0] != nullptr ? argv[0] : "";
 
   std::vector<std::string> items;
-  if (!CollectItems(argc, argv, scan.program, &items)) return ExitStatus::kUsageError;
+  if (!CollectItems(argc, argv, scan.program, &items, &config->argument_file_path)) {
+    return ExitStatus::kUsageError;
+  }
   config->items = items;
   if (std::optional<ExitStatus> help = ScanOptions(items, &scan, config)) return help;
   CheckMandatoryOptions(&scan);

@@ -20,6 +20,12 @@ namespace zor2 {
 bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,
                          std::string* err);
 
+// Sets `target` to the file that `path` finally names, its symbolic links
+// followed (the last one may dangle), or to `path` when it is no link: the
+// file that WriteFileAtomically replaces. False with errno set when a link
+// cannot be read or the links loop.
+bool FinalTarget(const std::string& path, std::string* target);
+
 // Makes SIGINT and SIGTERM (unless ignored from the start) remove the
 // temporary file being written before the process ends by the signal, and
 // makes a write past the file size limit fail with EFBIG rather than end the
