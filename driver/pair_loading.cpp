@@ -1,5 +1,8 @@
 #include "driver/pair_loading.h"
 
+#include <sys/stat.h>
+
+#include <cerrno>
 #include <filesystem>
 #include <new>
 #include <system_error>
@@ -12,6 +15,13 @@
 
 namespace zor2 {
 namespace {
+
+// Something stands at `path`, a link that leads nowhere included; a path that
+// cannot be looked at counts as there, so that its load names the reason.
+bool Exists(const std::string& path) {
+  struct stat status;
+  return ::lstat(path.c_str(), &status) == 0 || (errno != ENOENT && errno != ENOTDIR);
+}
 
 // Touches nothing but its own document, so that loads can run at once. A
 // document that does not fit in memory is a fault of its pair only.
@@ -60,7 +70,9 @@ bool ListDocumentPairs(const std::string& reference_dir, const std::string& chec
   for (std::string& entry : entries) {
     std::string name = BaseName(entry);
     std::string checked = JoinPath(checked_dir, name);
-    if (IsRegularFile(checked)) {
+    // Whatever stands under the name (a dangling link, a directory, a pipe)
+    // is the counterpart, which then fails to load and says why.
+    if (Exists(checked)) {
       pairs->push_back({std::move(entry), std::move(checked)});
     } else if (missing != nullptr) {
       missing->push_back(std::move(name));
