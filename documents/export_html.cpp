@@ -30,7 +30,7 @@ h4 { font-size: 1rem; margin: 1rem 0 0.4rem; }
 code, .value { font-family: "DejaVu Sans Mono", Menlo, Consolas, monospace; font-size: 0.9em; }
 .verdict { font-size: 1.2rem; font-weight: 700; padding: 0.6rem 0.9rem; border-radius: 6px;
   border: 2px solid; margin: 0.5rem 0; }
-.verdict.failed { color: var(--bad); background: #fef3f2; }
+.verdict.failed, .verdict.error { color: var(--bad); background: #fef3f2; }
 .verdict.passed { color: var(--good); background: #ecfdf3; }
 .notes li { font-weight: 600; color: var(--bad); }
 .muted, .group { color: var(--muted); font-weight: normal; }
@@ -324,7 +324,7 @@ std::string ExportHtml(const RunDescription& run, const RunSummary& summary,
   const std::string verdict = VerdictLine(summary);
   page << kHead << "<title>zor2check: ";
   page.Text(verdict) << "</title>\n" << kStyle << "<body>\n<header>\n<h1>zor2check report</h1>\n";
-  page << "<p id=\"verdict\" class=\"verdict " << (summary.failed ? "failed" : "passed") << "\">";
+  page << "<p id=\"verdict\" class=\"verdict " << VerdictName(VerdictOf(summary)) << "\">";
   page.Text(verdict) << "</p>\n<p class=\"scope\">";
   page.Text(ScopeLine(summary)) << "</p>\n";
   const std::vector<std::string> notes = SummaryNotes(summary);

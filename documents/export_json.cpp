@@ -7,9 +7,20 @@ namespace zor2 {
 
 namespace {
 
+void WriteAbsences(const char* kind, const std::vector<Absence>& absences, JsonWriter& json) {
+  for (const Absence& absence : absences) {
+    json.BeginObject();
+    json.Member("kind", kind);
+    json.Member("name", absence.name);
+    json.Member("accepted", absence.accepted);
+    json.Member("reason", absence.reason);
+    json.EndObject();
+  }
+}
+
 void WriteSummary(const RunSummary& summary, JsonWriter& json) {
   json.BeginObject();
-  json.Member("verdict", summary.failed ? "failed" : "passed");
+  json.Member("verdict", VerdictName(VerdictOf(summary)));
   const int total = TotalFindings(summary);
   json.Member("findings", total);
   json.Member("new", total - summary.accepted);
@@ -24,8 +35,26 @@ void WriteSummary(const RunSummary& summary, JsonWriter& json) {
   json.Member("frameworks", summary.frameworks);
   json.Member("pairs_compared", summary.pairs_compared);
   json.Member("pairs_skipped", summary.pairs_skipped);
-  json.Member("missing_counterparts", summary.missing_counterparts);
+  json.Member("files_checked", summary.files_checked);
+  json.Member("nothing_checked", summary.nothing_checked);
+  std::vector<std::string> missing;
+  for (const Absence& absence : summary.missing_documents) missing.push_back(absence.name);
+  json.Member("missing_counterparts", missing);
+  json.Key("without_counterpart");
+  json.BeginArray();
+  WriteAbsences("document", summary.missing_documents, json);
+  WriteAbsences("framework", summary.missing_frameworks, json);
+  json.EndArray();
   json.Member("stale_baseline_entries", summary.stale_baseline_entries);
+  json.Key("failures");
+  json.BeginArray();
+  for (const RunFailure& failure : summary.failures) {
+    json.BeginObject();
+    json.Member("path", failure.path);
+    json.Member("reason", failure.reason);
+    json.EndObject();
+  }
+  json.EndArray();
   json.EndObject();
 }
 

@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <string_view>
 #include <unordered_map>
+#include <utility>
 
 #include "documents/export_text.h"
 #include "documents/json_writer.h"
@@ -228,14 +229,32 @@ void WriteRunProperties(const RunDescription& run, const RunSummary& summary, Js
   json.Member("checked", run.checked);
   json.Member("report", run.report);
   json.Member("options", run.options);
-  json.Member("verdict", summary.failed ? "failed" : "passed");
+  json.Member("verdict", VerdictName(VerdictOf(summary)));
   json.Member("findings", TotalFindings(summary));
   json.Member("accepted", summary.accepted);
   json.Member("files", summary.files);
   json.Member("frameworks", summary.frameworks);
   json.Member("pairsCompared", summary.pairs_compared);
   json.Member("pairsSkipped", summary.pairs_skipped);
-  json.Member("missingCounterparts", summary.missing_counterparts);
+  json.Member("filesChecked", summary.files_checked);
+  json.Member("nothingChecked", summary.nothing_checked);
+  std::vector<std::string> missing;
+  for (const Absence& absence : summary.missing_documents) missing.push_back(absence.name);
+  json.Member("missingCounterparts", missing);
+  json.Key("withoutCounterpart");
+  json.BeginArray();
+  for (const auto& [kind, absences] : {std::pair{"document", &summary.missing_documents},
+                                       std::pair{"framework", &summary.missing_frameworks}}) {
+    for (const Absence& absence : *absences) {
+      json.BeginObject();
+      json.Member("kind", kind);
+      json.Member("name", absence.name);
+      json.Member("accepted", absence.accepted);
+      json.Member("reason", absence.reason);
+      json.EndObject();
+    }
+  }
+  json.EndArray();
   json.Member("staleBaselineEntries", summary.stale_baseline_entries);
   json.EndObject();
 }
@@ -272,7 +291,28 @@ std::string ExportSarif(const RunDescription& run, const RunSummary& summary,
   json.Key("invocations");
   json.BeginArray();
   json.BeginObject();
-  json.Member("executionSuccessful", summary.pairs_skipped == 0);
+  // Whatever the run could not do makes the run unsuccessful, so that no
+  // service takes its results for a complete check.
+  json.Member("executionSuccessful", summary.failures.empty());
+  if (!summary.failures.empty()) {
+    json.Key("toolExecutionNotifications");
+    json.BeginArray();
+    for (const RunFailure& failure : summary.failures) {
+      json.BeginObject();
+      json.Member("level", "error");
+      json.Key("message");
+      json.BeginObject();
+      json.Member("text", failure.path + ": " + failure.reason);
+      json.EndObject();
+      json.Key("properties");
+      json.BeginObject();
+      json.Member("path", failure.path);
+      json.Member("reason", failure.reason);
+      json.EndObject();
+      json.EndObject();
+    }
+    json.EndArray();
+  }
   json.EndObject();
   json.EndArray();
   json.Key("results");

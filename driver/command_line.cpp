@@ -29,12 +29,15 @@ constexpr std::string_view kUsage =
 // "-h" shows them after the usage text above, which usage errors show alone.
 constexpr std::string_view kMoreUsage =
     "   -summary        : Print one line counting the findings\n"
-    "   -fail           : Exit with status 3 when a finding is not accepted (implies -summary)\n"
+    "   -fail           : Exit with status 3 when the check does not pass (implies -summary)\n"
     "   -baseline FILE  : Accept the findings listed in FILE, an earlier report\n"
     "   -export PATH    : Also write the findings to PATH, as .json, .sarif, .md or .html\n"
     "                     (may be repeated)\n"
+    "   -markdown-full  : Write every finding to a .md export, past 65 536 characters\n"
+    "   -sarif-base DIR : The folder of the repository that file names are relative to,\n"
+    "                     for a .sarif export\n"
     "Exit status : 0 done, 1 usage error, 2 an input or output failed,\n"
-    "              3 with -fail, findings not accepted by the baseline\n";
+    "              3 with -fail, the check did not pass\n";
 
 // Writes the pieces and a line end. Pieces are written by length, so that an
 // item read from an argument file is shown whole whatever bytes it holds.
@@ -100,6 +103,10 @@ bool TakeValue(const std::string& option, const std::string& value, OptionScan* 
     config->baseline_path = value;
     return true;
   }
+  if (option == "-sarif-base") {
+    config->sarif_base = value;
+    return true;
+  }
   if (option == "-export") {
     if (!ExportFormatOf(value)) {
       WriteLine(stderr, {scan->program, ": -export ", value,
@@ -131,6 +138,10 @@ std::optional<ExitStatus> ScanOptions(const std::vector<std::string>& items, Opt
     }
     if (item == "-L") {
       config->settings.only_flagged_files = true;
+      continue;
+    }
+    if (item == "-markdown-full") {
+      config->markdown_full = true;
       continue;
     }
     if (item == "-summary" || item == "-fail") {

@@ -11,16 +11,18 @@ namespace zor2 {
 
 // What a run is asked to do, as read from the command line.
 struct RunConfiguration {
-  std::string reference_path;                     // "-r": a document or a directory of documents
-  std::string checked_path;                       // "-c": likewise
-  std::string output_path;                        // "-o": the report
-  std::optional<std::string> help_page_path;      // "-htm", unless given ""
-  CheckSettings settings;                         // "-L" and "-level"
-  bool summary = false;                           // "-summary", also set by "-fail"
-  bool fail = false;                              // "-fail": status 3 for findings not accepted
-  std::optional<std::string> baseline_path;       // "-baseline"
-  std::vector<std::string> export_paths;          // "-export", in their order
-  std::vector<std::string> items;                 // the command line as read, for the exports
+  std::string reference_path;                 // "-r": a document or a directory of documents
+  std::string checked_path;                   // "-c": likewise
+  std::string output_path;                    // "-o": the report
+  std::optional<std::string> help_page_path;  // "-htm", unless given ""
+  CheckSettings settings;                     // "-L" and "-level"
+  bool summary = false;                       // "-summary", also set by "-fail"
+  bool fail = false;                          // "-fail": status 3 when the check does not pass
+  std::optional<std::string> baseline_path;   // "-baseline"
+  std::vector<std::string> export_paths;      // "-export", in their order
+  bool markdown_full = false;      // "-markdown-full": the Markdown export holds every finding
+  std::string sarif_base;          // "-sarif-base": the folder file names are relative to
+  std::vector<std::string> items;  // the command line as read, for the exports
   std::optional<std::string> argument_file_path;  // "= PATH", when its items were read
 };
 

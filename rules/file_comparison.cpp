@@ -103,6 +103,7 @@ void CompareInterfaceFiles(const xml::Element& reference, const xml::Element& ch
   const char* required = settings.only_flagged_files ? "@ZOR2Level" : "Aut";
   for (const xml::Element* file : GroupFiles(reference, group, required)) {
     if (!PassesFileFilter(*file, settings)) continue;
+    if (FindingCollector* collector = report.collector()) collector->CountCheckedFiles(1);
     ReportMirror report_file(report_group, "File");
     MirrorFile(report_file, *file, settings);
 

@@ -53,6 +53,14 @@ class FindingCollector {
   std::vector<Finding>& findings() { return findings_; }
   bool report_paths() const { return report_paths_; }
 
+  // What was checked beside the findings: the reference files that passed
+  // the file filter, and the reference frameworks without counterpart (by
+  // name, as written).
+  void CountCheckedFiles(int count) { files_checked_ += count; }
+  int files_checked() const { return files_checked_; }
+  void NoteMissingFramework(const char* name) { missing_frameworks_.push_back(AsWritten(name)); }
+  std::vector<std::string>& missing_frameworks() { return missing_frameworks_; }
+
   // A collector for part of the same comparison, with the same documents.
   FindingCollector Part() const { return FindingCollector(reference_, checked_, report_paths_); }
 
@@ -61,6 +69,8 @@ class FindingCollector {
   const xml::OriginalValues* checked_;
   bool report_paths_;
   std::vector<Finding> findings_;
+  int files_checked_ = 0;
+  std::vector<std::string> missing_frameworks_;
 };
 
 }  // namespace zor2

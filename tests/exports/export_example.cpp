@@ -43,7 +43,10 @@ Run ExampleRun() {
                      "examples/reference",
                      "examples/checked",
                      "build/examples-report.xml",
-                     {"-L", "-level", "M4R20"}};
+                     {"-L", "-level", "M4R20"},
+                     {},
+                     false,
+                     {}};
   const std::string doc = "DocumentModel";
   const std::string geo = "Geometry";
   run.findings = {
@@ -89,7 +92,10 @@ Run HostileRun() {
                      "ref dir/<i>a</i>|b",
                      "chk`dir`",
                      "out \"report\".xml",
-                     {"-level", "M4R20 | rm -rf"}};
+                     {"-level", "M4R20 | rm -rf"},
+                     {},
+                     false,
+                     {}};
   const std::string fw = "<b>Bold</b> & \"Co\"";
   run.findings = {
       {MessageCode::kMRTHC, fw, "Public", "a|b <c>.h", "K`lass`", "Get",
@@ -110,7 +116,7 @@ Run HostileRun() {
   };
   run.summary.pairs_compared = 3;
   run.summary.pairs_skipped = 1;
-  run.summary.missing_counterparts = {"Gone <1>.xml", "Old|2.xml"};
+  run.summary.missing_documents = {zor2::Absence("Gone <1>.xml"), zor2::Absence("Old|2.xml")};
   run.summary.stale_baseline_entries = 2;
   Count(run, 2, 2);
   return run;
@@ -148,7 +154,7 @@ int main(int argc, char** argv) {
   std::error_code error;
   std::filesystem::create_directories(directory, error);
   Run empty;
-  empty.description = {"example", "ref.xml", "chk.xml", "out.xml", {}};
+  empty.description = {"example", "ref.xml", "chk.xml", "out.xml", {}, {}, false, {}};
   empty.summary.pairs_compared = 1;
   const bool written = WriteRun(directory, "example", ExampleRun()) &&
                        WriteRun(directory, "hostile", HostileRun()) &&
