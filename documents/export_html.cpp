@@ -174,7 +174,8 @@ const std::array<std::string, kMessageTypes.size()>& EscapedHelpTexts() {
   return texts;
 }
 
-void WriteValueCell(Page& page, const std::string& value) {
+// A value, and how many more there are that it leaves out.
+void WriteValueCell(Page& page, const std::string& value, int more = 0) {
   page << "<td>";
   if (value.empty()) {
     page << "<em class=\"muted\">none</em>";
@@ -182,6 +183,10 @@ void WriteValueCell(Page& page, const std::string& value) {
     page << "<code class=\"value\">";
     page.Text(value);
     page << "</code>";
+  }
+  if (more > 0) {
+    page << "<br><em class=\"muted\">and ";
+    page.Number(more) << " more</em>";
   }
   page << "</td>";
 }
@@ -211,7 +216,7 @@ void WriteFinding(Page& page, const Finding& finding, size_t index) {
   if (!finding.reference_value.empty() || !finding.checked_value.empty()) {
     page << "<table class=\"values\"><tr><th>Reference</th><th>Checked</th></tr><tr>";
     WriteValueCell(page, finding.reference_value);
-    WriteValueCell(page, finding.checked_value);
+    WriteValueCell(page, finding.checked_value, finding.more_replacements);
     page << "</tr></table>\n";
   }
   if (finding.accepted) {

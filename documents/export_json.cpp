@@ -72,6 +72,7 @@ void WriteFinding(const Finding& finding, JsonWriter& json) {
   json.Member("argument", finding.argument);
   json.Member("reference_value", finding.reference_value);
   json.Member("checked_value", finding.checked_value);
+  json.Member("more_replacements", finding.more_replacements);
   json.Member("accepted", finding.accepted);
   json.Member("reason", finding.reason);
   json.EndObject();

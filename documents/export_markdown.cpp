@@ -90,8 +90,11 @@ void AppendFile(const FileFindings& file, std::string* out) {
     out->append("| `" + std::string(MessageTypeOf(finding->code).id) + "` | " +
                 MarkdownCode(finding->class_name) + " | " + MethodCell(*finding) + " | " +
                 ValueCell(finding->reference_value, finding->checked_value) + " | " +
-                ValueCell(finding->checked_value, finding->reference_value) + " | " +
-                StatusCell(*finding) + " |\n");
+                ValueCell(finding->checked_value, finding->reference_value) +
+                (finding->more_replacements > 0
+                     ? "<br>*and " + std::to_string(finding->more_replacements) + " more*"
+                     : "") +
+                " | " + StatusCell(*finding) + " |\n");
   }
   out->append("\n");
 }

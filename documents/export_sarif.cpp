@@ -128,6 +128,9 @@ std::string MessageText(const Finding& finding) {
     text += finding.reference_value.empty() ? "(none)" : finding.reference_value;
     text += "\nChecked: ";
     text += finding.checked_value.empty() ? "(none)" : finding.checked_value;
+    if (finding.more_replacements > 0) {
+      text += "\n(and " + std::to_string(finding.more_replacements) + " more)";
+    }
   }
   return text;
 }
@@ -219,6 +222,7 @@ void WriteResult(const Finding& finding, const std::string& fingerprint, JsonWri
   json.Member("argument", finding.argument);
   json.Member("referenceValue", finding.reference_value);
   json.Member("checkedValue", finding.checked_value);
+  json.Member("moreReplacements", finding.more_replacements);
   json.EndObject();
   json.EndObject();
 }

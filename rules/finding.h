@@ -25,6 +25,9 @@ struct Finding {
   // each element of its chain, followed by its ID: what a baseline matches
   // (filled only for a run with a baseline).
   std::string report_path;
+  // MHBDM: how many more checked methods of the same name there are than
+  // the likely replacements the checked value shows.
+  int more_replacements = 0;
 };
 
 // One step of a report path: `tag`, its "Name" and, for a "Method", its

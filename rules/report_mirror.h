@@ -3,6 +3,8 @@
 #include <array>
 #include <cstddef>
 #include <memory>
+#include <string>
+#include <utility>
 
 #include "platform/xml/output_element.h"
 #include "rules/finding.h"
@@ -70,8 +72,14 @@ class ReportMirror {
 
 // What a rule compared for a finding, as the documents wrote it.
 struct ComparedValues {
+  ComparedValues(std::string reference_value, std::string checked_value, int more = 0)
+      : reference(std::move(reference_value)),
+        checked(std::move(checked_value)),
+        more_checked(more) {}
+
   std::string reference;
   std::string checked;
+  int more_checked;  // checked values left out of `checked`, as counted
 };
 
 // Records a finding of type `code` under `parent`: an "Error" element with
@@ -87,6 +95,7 @@ void AddError(ReportMirror& parent, MessageCode code, Describe describe) {
     ComparedValues values = describe(*parent.collector());
     finding->reference_value = std::move(values.reference);
     finding->checked_value = std::move(values.checked);
+    finding->more_replacements = values.more_checked;
   }
 }
 
