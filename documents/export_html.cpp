@@ -22,7 +22,8 @@ constexpr std::string_view kStyle = R"(<style>
 :root { color-scheme: light; --line: #d0d4da; --muted: #5b6470; --bad: #b42318; --good: #1a7f37; }
 * { box-sizing: border-box; }
 body { margin: 0 auto; max-width: 72rem; padding: 1rem 1.5rem 3rem; color: #1f2328;
-  font: 15px/1.45 system-ui, -apple-system, "Segoe UI", "DejaVu Sans", sans-serif; }
+  font: 15px/1.45 system-ui, -apple-system, "Segoe UI", "DejaVu Sans", sans-serif;
+  overflow-wrap: anywhere; }
 h1 { font-size: 1.5rem; margin: 0.5rem 0; }
 h2 { font-size: 1.3rem; margin: 2rem 0 0.5rem; border-bottom: 2px solid var(--line); }
 h3 { font-size: 1.1rem; margin: 1.25rem 0 0.5rem; }
@@ -201,15 +202,22 @@ void WriteFinding(Page& page, const Finding& finding, size_t index) {
   page.Text(type.id) << "</span> <span class=\"fullname\">";
   page.Text(type.full_name) << "</span> <span class=\"state " << state << "\">" << state
                             << "</span></div>\n";
-  if (!finding.method.empty() || !finding.signature.empty() || !finding.argument.empty()) {
+  const bool in_method = !finding.method.empty() || !finding.signature.empty();
+  if (in_method || !finding.argument.empty() || finding.line > 0) {
     page << "<div class=\"where\">";
-    if (!finding.method.empty() || !finding.signature.empty()) {
+    if (in_method) {
       page << "Method <code>";
       page.Text(finding.signature.empty() ? finding.method : finding.signature) << "</code>";
     }
     if (!finding.argument.empty()) {
       page << " argument <code>";
       page.Text(finding.argument) << "</code>";
+    }
+    if (finding.line > 0) {
+      page << (in_method || !finding.argument.empty() ? " at <code class=\"line\">"
+                                                      : "At <code class=\"line\">");
+      page.Text(finding.file) << ":";
+      page.Number(finding.line) << "</code>";
     }
     page << "</div>\n";
   }

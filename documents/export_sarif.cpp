@@ -5,6 +5,7 @@
 #include <string_view>
 #include <unordered_map>
 #include <utility>
+#include <vector>
 
 #include "documents/export_text.h"
 #include "documents/json_writer.h"
@@ -33,20 +34,46 @@ std::string RuleName(std::string_view full_name) {
   return name;
 }
 
-// `path` as a relative URI reference: every byte but the unreserved ones and
-// "/" percent-encoded, so that a ":" or a blank cannot change its meaning.
-std::string RelativeUri(std::string_view path) {
+// The base that every artifact's URI is relative to: the root of the
+// repository, which only the service that reads the log knows.
+constexpr std::string_view kSourceRoot = "SRCROOT";
+
+// `folder` and then `file` as one relative URI reference: "/" between the
+// segments, no empty, "." or ".." segment (a ".." takes the segment before it
+// away, and none before the start), every byte of a segment but the
+// unreserved ones percent-encoded, so that a ":" or a blank cannot change its
+// meaning.
+std::string RelativeUri(std::string_view folder, std::string_view file) {
   static constexpr char kHex[] = "0123456789ABCDEF";
-  std::string uri;
-  for (char c : path) {
-    const auto byte = static_cast<unsigned char>(c);
-    if (std::isalnum(byte) || c == '-' || c == '.' || c == '_' || c == '~' || c == '/') {
-      uri.push_back(c);
-    } else {
-      uri.push_back('%');
-      uri.push_back(kHex[byte >> 4]);
-      uri.push_back(kHex[byte & 0xF]);
+  std::vector<std::string> segments;
+  for (std::string_view path : {folder, file}) {
+    while (!path.empty()) {
+      const size_t slash = path.find('/');
+      const std::string_view segment = path.substr(0, slash);
+      path = slash == std::string_view::npos ? std::string_view() : path.substr(slash + 1);
+      if (segment.empty() || segment == ".") continue;
+      if (segment == "..") {
+        if (!segments.empty()) segments.pop_back();
+        continue;
+      }
+      std::string encoded;
+      for (char c : segment) {
+        const auto byte = static_cast<unsigned char>(c);
+        if (std::isalnum(byte) || c == '-' || c == '.' || c == '_' || c == '~') {
+          encoded.push_back(c);
+        } else {
+          encoded.push_back('%');
+          encoded.push_back(kHex[byte >> 4]);
+          encoded.push_back(kHex[byte & 0xF]);
+        }
+      }
+      segments.push_back(std::move(encoded));
     }
+  }
+  std::string uri;
+  for (const std::string& segment : segments) {
+    if (!uri.empty()) uri += '/';
+    uri += segment;
   }
   return uri;
 }
@@ -163,15 +190,22 @@ void WriteRules(JsonWriter& json) {
   json.EndArray();
 }
 
-void WriteLocation(const Finding& finding, JsonWriter& json) {
+void WriteLocation(const Finding& finding, std::string_view folder, JsonWriter& json) {
   json.BeginArray();
   json.BeginObject();
   json.Key("physicalLocation");
   json.BeginObject();
   json.Key("artifactLocation");
   json.BeginObject();
-  json.Member("uri", RelativeUri(finding.file));
+  json.Member("uri", RelativeUri(folder, finding.file));
+  json.Member("uriBaseId", kSourceRoot);
   json.EndObject();
+  if (finding.line > 0) {
+    json.Key("region");
+    json.BeginObject();
+    json.Member("startLine", finding.line);
+    json.EndObject();
+  }
   json.EndObject();
   json.Key("logicalLocations");
   json.BeginArray();
@@ -185,7 +219,8 @@ void WriteLocation(const Finding& finding, JsonWriter& json) {
   json.EndArray();
 }
 
-void WriteResult(const Finding& finding, const std::string& fingerprint, JsonWriter& json) {
+void WriteResult(const Finding& finding, const std::string& fingerprint, std::string_view folder,
+                 JsonWriter& json) {
   const MessageType& type = MessageTypeOf(finding.code);
   json.BeginObject();
   json.Member("ruleId", type.id);
@@ -196,7 +231,7 @@ void WriteResult(const Finding& finding, const std::string& fingerprint, JsonWri
   json.Member("text", MessageText(finding));
   json.EndObject();
   json.Key("locations");
-  WriteLocation(finding, json);
+  WriteLocation(finding, folder, json);
   json.Key("partialFingerprints");
   json.BeginObject();
   json.Member("zor2checkFinding/v1", fingerprint);
@@ -292,6 +327,16 @@ std::string ExportSarif(const RunDescription& run, const RunSummary& summary,
   WriteRules(json);
   json.EndObject();
   json.EndObject();
+  json.Key("originalUriBaseIds");
+  json.BeginObject();
+  json.Key(kSourceRoot);
+  json.BeginObject();
+  json.Key("description");
+  json.BeginObject();
+  json.Member("text", "The root of the repository, which every artifact's URI is relative to");
+  json.EndObject();
+  json.EndObject();
+  json.EndObject();
   json.Key("invocations");
   json.BeginArray();
   json.BeginObject();
@@ -326,7 +371,7 @@ std::string ExportSarif(const RunDescription& run, const RunSummary& summary,
   for (const Finding& finding : findings) {
     std::string key = ChainKey(finding);
     const int occurrence = ++seen[key];
-    WriteResult(finding, Fingerprint(key, occurrence), json);
+    WriteResult(finding, Fingerprint(key, occurrence), run.sarif_base, json);
   }
   json.EndArray();
   json.Key("properties");

@@ -244,28 +244,36 @@ std::string PlaceInFile(const Finding& finding) {
   return place;
 }
 
-std::vector<FrameworkFindings> GroupByFrameworkAndFile(const std::vector<Finding>& findings) {
+std::vector<FrameworkFindings> GroupByFrameworkAndFile(
+    const std::vector<const Finding*>& findings) {
   std::vector<FrameworkFindings> frameworks;
   std::unordered_map<std::string, size_t> framework_index;
   // Per framework, the index of each file, keyed by group and name.
   std::vector<std::unordered_map<std::string, size_t>> file_index;
-  for (const Finding& finding : findings) {
+  for (const Finding* finding : findings) {
     auto [framework_it, new_framework] =
-        framework_index.try_emplace(finding.framework, frameworks.size());
+        framework_index.try_emplace(finding->framework, frameworks.size());
     if (new_framework) {
-      frameworks.push_back({finding.framework, {}});
+      frameworks.push_back({finding->framework, {}});
       file_index.emplace_back();
     }
     FrameworkFindings& framework = frameworks[framework_it->second];
-    std::string file_key = finding.group;
+    std::string file_key = finding->group;
     file_key += '\0';
-    file_key += finding.file;
+    file_key += finding->file;
     auto [file_it, new_file] =
         file_index[framework_it->second].try_emplace(file_key, framework.files.size());
-    if (new_file) framework.files.push_back({finding.group, finding.file, {}});
-    framework.files[file_it->second].findings.push_back(&finding);
+    if (new_file) framework.files.push_back({finding->group, finding->file, {}});
+    framework.files[file_it->second].findings.push_back(finding);
   }
   return frameworks;
+}
+
+std::vector<FrameworkFindings> GroupByFrameworkAndFile(const std::vector<Finding>& findings) {
+  std::vector<const Finding*> all;
+  all.reserve(findings.size());
+  for (const Finding& finding : findings) all.push_back(&finding);
+  return GroupByFrameworkAndFile(all);
 }
 
 }  // namespace zor2

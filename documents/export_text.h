@@ -61,5 +61,6 @@ struct FrameworkFindings {
 // The findings grouped by framework, then by group and file, each in the order
 // of its first finding; the findings keep their order inside a file.
 std::vector<FrameworkFindings> GroupByFrameworkAndFile(const std::vector<Finding>& findings);
+std::vector<FrameworkFindings> GroupByFrameworkAndFile(const std::vector<const Finding*>& findings);
 
 }  // namespace zor2

@@ -25,6 +25,7 @@ void CompareClasses(const xml::Element& reference, const xml::Element& checked,
       AddError(report_class, MessageCode::kCHBD);
       continue;
     }
+    report_class.SetCounterpart(counterpart);
     CompareMethods(*cls, *counterpart, settings, report_class, log);
     if (check_new_pure_virtual) CheckNewPureVirtualMethods(*cls, *counterpart, report_class, log);
   }

@@ -114,6 +114,7 @@ void CompareInterfaceFiles(const xml::Element& reference, const xml::Element& ch
       }
       continue;
     }
+    report_file.SetCounterpart(counterpart);
     bool check_new_pure_virtual = false;
     if (settings.only_flagged_files) {
       const bool exempt = RecentlyDeprecatedFile(*file, settings.current_level);

@@ -28,6 +28,10 @@ struct Finding {
   // MHBDM: how many more checked methods of the same name there are than
   // the likely replacements the checked value shows.
   int more_replacements = 0;
+  // The 1-based line, in the checked file, of the declaration the finding is
+  // about, or of the innermost one still there (the class of a deleted
+  // method): the "Line" of the checked element; 0 when none says.
+  int line = 0;
 };
 
 // One step of a report path: `tag`, its "Name" and, for a "Method", its

@@ -133,6 +133,7 @@ void CompareMethods(const xml::Element& reference, const xml::Element& checked,
       });
       continue;
     }
+    report_method.SetCounterpart(checked_methods[j].element);
     CompareMethodPair(m, i, checked_methods[j], j, automation, order_reported, report_method, log);
   }
 }

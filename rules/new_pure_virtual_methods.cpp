@@ -18,6 +18,7 @@ void CheckNewPureVirtualMethods(const xml::Element& reference, const xml::Elemen
     if (declared.Contains(n)) continue;
     ReportMirror report_method(report, "Method");
     MirrorMethod(report_method, n);
+    report_method.SetCounterpart(n.element);
     AddError(report_method, MessageCode::kNPVM);
   }
 }

@@ -47,6 +47,12 @@ class ReportMirror {
   // not exist yet.
   xml::OutputElement* Element();
 
+  // The checked element that the mirrored element pairs with (or, for a new
+  // element, the checked element itself), whose "Line" places the findings
+  // under it, when nothing below says better. `checked` must outlive the
+  // mirror.
+  void SetCounterpart(const xml::Element* checked) { counterpart_ = checked; }
+
   // Where findings recorded under this mirror are collected, or null.
   FindingCollector* collector() const;
   // Fills the location of `finding` from this mirror and its ancestors.
@@ -65,6 +71,7 @@ class ReportMirror {
   const char* tag_ = nullptr;
   const char* name_ = nullptr;       // its "Name", for findings
   const char* signature_ = nullptr;  // its "Signature", for findings
+  const xml::Element* counterpart_ = nullptr;
   xml::OutputElement* element_ = nullptr;
   std::array<Attribute, kMaxPendingAttributes> pending_{};
   size_t pending_count_ = 0;
