@@ -70,6 +70,7 @@ void WriteFinding(const Finding& finding, JsonWriter& json) {
   json.Member("method", finding.method);
   json.Member("signature", finding.signature);
   json.Member("argument", finding.argument);
+  json.Member("line", finding.line);
   json.Member("reference_value", finding.reference_value);
   json.Member("checked_value", finding.checked_value);
   json.Member("more_replacements", finding.more_replacements);
