@@ -97,8 +97,9 @@ std::string SummaryLine(const RunSummary& summary) {
 
 std::string NothingCheckedReason(const RunSummary& summary, bool only_flagged_files) {
   if (summary.pairs_compared == 0) return "no document pair was compared";
-  return only_flagged_files ? "no reference file has @ZOR2Level \"L1\" and Aut \"Y\" (-L)"
-                            : "no reference file has Aut \"Y\"";
+  return only_flagged_files
+             ? "no reference file of a compared framework has @ZOR2Level \"L1\" and Aut \"Y\" (-L)"
+             : "no reference file of a compared framework has Aut \"Y\"";
 }
 
 }  // namespace zor2
