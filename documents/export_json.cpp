@@ -1,22 +1,13 @@
 #include "documents/export_json.h"
 
+#include <utility>
+
 #include "documents/export_text.h"
 #include "documents/json_writer.h"
 
 namespace zor2 {
 
 namespace {
-
-void WriteAbsences(const char* kind, const std::vector<Absence>& absences, JsonWriter& json) {
-  for (const Absence& absence : absences) {
-    json.BeginObject();
-    json.Member("kind", kind);
-    json.Member("name", absence.name);
-    json.Member("accepted", absence.accepted);
-    json.Member("reason", absence.reason);
-    json.EndObject();
-  }
-}
 
 void WriteSummary(const RunSummary& summary, JsonWriter& json) {
   json.BeginObject();
@@ -41,10 +32,7 @@ void WriteSummary(const RunSummary& summary, JsonWriter& json) {
   for (const Absence& absence : summary.missing_documents) missing.push_back(absence.name);
   json.Member("missing_counterparts", missing);
   json.Key("without_counterpart");
-  json.BeginArray();
-  WriteAbsences("document", summary.missing_documents, json);
-  WriteAbsences("framework", summary.missing_frameworks, json);
-  json.EndArray();
+  WriteAbsences(summary, json);
   json.Member("stale_baseline_entries", summary.stale_baseline_entries);
   json.Key("failures");
   json.BeginArray();
@@ -80,6 +68,22 @@ void WriteFinding(const Finding& finding, JsonWriter& json) {
 }
 
 }  // namespace
+
+void WriteAbsences(const RunSummary& summary, JsonWriter& json) {
+  json.BeginArray();
+  for (const auto& [kind, absences] : {std::pair{"document", &summary.missing_documents},
+                                       std::pair{"framework", &summary.missing_frameworks}}) {
+    for (const Absence& absence : *absences) {
+      json.BeginObject();
+      json.Member("kind", kind);
+      json.Member("name", absence.name);
+      json.Member("accepted", absence.accepted);
+      json.Member("reason", absence.reason);
+      json.EndObject();
+    }
+  }
+  json.EndArray();
+}
 
 std::string ExportJson(const RunDescription& run, const RunSummary& summary,
                        const std::vector<Finding>& findings) {

@@ -7,6 +7,7 @@
 #include <utility>
 #include <vector>
 
+#include "documents/export_json.h"
 #include "documents/export_text.h"
 #include "documents/json_writer.h"
 
@@ -281,19 +282,7 @@ void WriteRunProperties(const RunDescription& run, const RunSummary& summary, Js
   for (const Absence& absence : summary.missing_documents) missing.push_back(absence.name);
   json.Member("missingCounterparts", missing);
   json.Key("withoutCounterpart");
-  json.BeginArray();
-  for (const auto& [kind, absences] : {std::pair{"document", &summary.missing_documents},
-                                       std::pair{"framework", &summary.missing_frameworks}}) {
-    for (const Absence& absence : *absences) {
-      json.BeginObject();
-      json.Member("kind", kind);
-      json.Member("name", absence.name);
-      json.Member("accepted", absence.accepted);
-      json.Member("reason", absence.reason);
-      json.EndObject();
-    }
-  }
-  json.EndArray();
+  WriteAbsences(summary, json);
   json.Member("staleBaselineEntries", summary.stale_baseline_entries);
   json.EndObject();
 }
