@@ -4,6 +4,7 @@
 
 #include <sstream>
 
+#include "platform/tools/version.h"
 #include "tests/test_util.h"
 
 namespace zor2::describe {
@@ -70,9 +71,9 @@ TEST(ReadDescribeCommandLine, FillsEveryOptionInAnyOrder) {
 TEST(ReadDescribeCommandLine, DefaultsWhenOnlyTheRequiredOptionsAreGiven) {
   const Outcome outcome = Read({"-framework", "F", "-public", "p", "-o", "o.xml"});
   ASSERT_FALSE(outcome.status.has_value());
-  EXPECT_EQ(outcome.options.standard, "c++17");
-  EXPECT_FALSE(outcome.options.protected_dir || outcome.options.default_level ||
-               outcome.options.default_usage);
+  EXPECT_FALSE(outcome.options.standard || outcome.options.protected_dir ||
+               outcome.options.default_level || outcome.options.default_usage ||
+               outcome.options.build_dir);
 }
 
 TEST(ReadDescribeCommandLine, HelpWinsUnlessTakenAsAValue) {
@@ -84,6 +85,21 @@ TEST(ReadDescribeCommandLine, HelpWinsUnlessTakenAsAValue) {
   const Outcome value = Read({"-framework", "-h", "-public", "p", "-o", "o.xml"});
   EXPECT_FALSE(value.status.has_value());
   EXPECT_EQ(value.options.framework, "-h");
+}
+
+TEST(ReadDescribeCommandLine, LongFormsForHelpAndVersion) {
+  const Outcome help = Read({"--help"});
+  EXPECT_EQ(help.status, DescribeStatus::kDone);
+  EXPECT_EQ(help.out, kDescribeUsage);
+
+  const Outcome version = Read({"-o", "o.xml", "--version", "-public"});
+  EXPECT_EQ(version.status, DescribeStatus::kDone);
+  EXPECT_EQ(version.out, std::string("zor2describe ") + kVersion + "\n");
+  EXPECT_EQ(version.err, "");
+
+  // Only the long forms: a near miss is an unknown option.
+  const Outcome near_miss = Read({"-version"});
+  EXPECT_EQ(near_miss.status, DescribeStatus::kUsageError);
 }
 
 class ArgumentFileTest : public testing::TempDirTest {};

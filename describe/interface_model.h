@@ -11,7 +11,7 @@ namespace zor2::describe {
 // attributes that are left out when absent.
 
 struct ArgDescription {
-  std::string type;                  // as clang spells the declared type
+  std::string type;                  // the type's identity (see type_spelling.h)
   std::string name;                  // empty for an unnamed parameter
   std::optional<std::string> value;  // the default argument's source text
   bool retval = false;               // named by the method's @ZOR2Retval tag
@@ -27,6 +27,8 @@ struct MethodDescription {
   bool nodoc = false;
   std::optional<std::string> deprecated;
   std::vector<ArgDescription> args;
+  unsigned line = 0;      // of the declaration; 0 for a member the compiler declares
+  bool implicit = false;  // declared by the compiler, not written in the header
 };
 
 struct ClassDescription {
@@ -34,6 +36,7 @@ struct ClassDescription {
   std::string aut;   // "Y" for an automation class, else "N"
   std::optional<std::string> deprecated;
   std::vector<MethodDescription> methods;
+  unsigned line = 0;  // of the definition
 };
 
 struct FileDescription {

@@ -236,14 +236,15 @@ std::string MarkdownText(std::string_view text) {
       if (c == '\r' && i + 1 < valid.size() && valid[i + 1] == '\n') ++i;
       continue;
     }
-    // Autolinks: "http://" and the like start at an unescaped ":", "www."
-    // at its "."; an e-mail address is found in the text whatever its
-    // escapes, so an empty comment splits the text before an "@" that
-    // follows what could be its local part.
+    // Autolinks: "http://" and the like start at an unescaped ":" before
+    // "//", "www." at its "."; an e-mail address is found in the text
+    // whatever its escapes, so an empty comment splits the text before an
+    // "@" that follows what could be its local part.
     if (c == '@' && i > 0 && IsEmailCharacter(valid[i - 1])) escaped += "<!-- -->";
     const bool after_www = i >= 3 && (valid[i - 1] | 0x20) == 'w' && (valid[i - 2] | 0x20) == 'w' &&
                            (valid[i - 3] | 0x20) == 'w';
-    if (kMarkupCharacters.find(c) != std::string_view::npos || c == ':' ||
+    const bool before_slashes = valid.compare(i + 1, 2, "//") == 0;
+    if (kMarkupCharacters.find(c) != std::string_view::npos || (c == ':' && before_slashes) ||
         (c == '.' && after_www)) {
       escaped += '\\';
     }

@@ -18,8 +18,8 @@ TEST(MarkdownTextTest, EscapesMarkupAndKeepsLineBreaksInsideACell) {
 // Hosting services turn URLs, "www." names and e-mail addresses into links,
 // the last whatever their escapes: each is broken up where it would start.
 TEST(MarkdownTextTest, BreaksUpWhatWouldBecomeALink) {
-  EXPECT_EQ(MarkdownText("https://a.example www.b.com WWW.c.com wwwx.d"),
-            "https\\://a.example www\\.b.com WWW\\.c.com wwwx.d");
+  EXPECT_EQ(MarkdownText("https://a.example www.b.com WWW.c.com wwwx.d FAILED: 1"),
+            "https\\://a.example www\\.b.com WWW\\.c.com wwwx.d FAILED: 1");
   EXPECT_EQ(MarkdownText("me@x.com @team"), "me<!-- -->\\@x.com \\@team");
 }
 

@@ -11,6 +11,7 @@
 #include "platform/tools/argument_file.h"
 #include "platform/tools/log.h"
 #include "platform/tools/printable_path.h"
+#include "platform/tools/version.h"
 #include "rules/attribute_values.h"
 
 namespace zor2 {
@@ -132,8 +133,12 @@ std::optional<ExitStatus> ScanOptions(const std::vector<std::string>& items, Opt
       scan->failed = true;
       break;
     }
-    if (item == "-h") {
+    if (item == "-h" || item == "--help") {
       WriteLine(stdout, {kUsage, kMoreUsage});
+      return ExitStatus::kDone;
+    }
+    if (item == "--version") {
+      WriteLine(stdout, {"zor2check ", kVersion});
       return ExitStatus::kDone;
     }
     if (item == "-L") {

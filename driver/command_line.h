@@ -28,12 +28,13 @@ struct RunConfiguration {
 
 // Reads the program's arguments (`argv[0]` is the program name; `argv` holds
 // `argc` entries), or the items of the argument file named by the two
-// arguments "=" and a path. Usage errors go to standard error, the "-h" text
-// to standard output. An output that is the same file as an input document or
-// as the other output is a usage error. When the run may go on, fills `config`, writes the
-// banner and the level to the standard log and returns nothing; otherwise
-// returns the status the process must end with (a usage error, an unreadable
-// argument file, or "-h").
+// arguments "=" and a path. Usage errors go to standard error, the "-h" (or
+// "--help") text and the "--version" line to standard output. An output that
+// is the same file as an input document or as the other output is a usage
+// error. When the run may go on, fills `config`, writes the banner and the
+// level to the standard log and returns nothing; otherwise returns the status
+// the process must end with (a usage error, an unreadable argument file,
+// "-h", "--help" or "--version").
 std::optional<ExitStatus> ReadCommandLine(int argc, const char* const* argv,
                                           RunConfiguration* config);
 

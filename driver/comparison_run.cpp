@@ -1,21 +1,26 @@
 // Thread model. The main thread runs the whole program and is the only one
-// that writes the report, the help page and the standard log. Other threads
-// only ever read what no thread changes any more and fill what they were
-// handed:
-// - pair loading (PairReader, LoadPair) reads and prepares the two documents
-//   of a pair on two threads, and in directory mode the next small pairs while
-//   the current one is compared; each load owns the document it makes;
+// that writes the report, the help page and the standard log. Every other
+// thread is a worker of the run's one executor (platform/tools/executor.h),
+// started once and sized from the machine's processors; a task that no worker
+// has started when the main thread needs its result runs on the main thread
+// instead, so the run does all its work even when no thread could be started.
+// Tasks only ever read what no thread changes any more and fill what they
+// were handed:
+// - pair loading (PairReader) reads and prepares each document as a task, the
+//   two of the current pair and, while it is compared, those of the next
+//   small pairs; each load owns the document it makes;
 // - the framework comparison (CompareFrameworks) compares framework pairs on
-//   the main thread and one helper, each pair into a report branch and a log
+//   the main thread and on workers, each pair into a report branch and a log
 //   of its own, which the main thread appends to the report and replays into
 //   the standard log in reference order;
-// - the documents of a compared pair are freed on a thread of their own;
-// - once every finding is final, each export is made and written on a thread
-//   of its own (WriteExports), from a copy of the summary, while the main
-//   thread writes the report.
-// So the report and every log line are the same, byte for byte, as a
-// single-threaded run's. Should a thread not start, its work runs on the main
-// thread instead.
+// - the documents of a compared large pair are freed by a task (small ones on
+//   the main thread); those of the last pair only once the outputs are
+//   written, so that freeing them does not slow the writing;
+// - once every finding is final, each export is made and written by a task
+//   (WriteExports), from a copy of the summary, while the main thread writes
+//   the report.
+// No thread ever waits by spinning. So the report and every log line are the
+// same, byte for byte, as a single-threaded run's.
 
 #include "driver/comparison_run.h"
 
@@ -24,7 +29,6 @@
 #include <cerrno>
 #include <csignal>
 #include <cstring>
-#include <future>
 #include <iterator>
 #include <memory>
 #include <new>
@@ -38,19 +42,19 @@
 #include "documents/run_summary.h"
 #include "driver/export_writing.h"
 #include "driver/pair_loading.h"
-#include "platform/tools/background.h"
+#include "platform/tools/executor.h"
 #include "platform/tools/file_output.h"
 #include "platform/tools/log.h"
 #include "platform/tools/paths.h"
 #include "platform/tools/printable_path.h"
+#include "platform/tools/version.h"
 #include "platform/xml/output_element.h"
 #include "rules/framework_comparison.h"
 
 namespace zor2 {
 namespace {
 
-constexpr const char* kToolVersion = "zor2check 2.0";
-// What an ERROR line names when the summary could not be made.
+// What an ERROR line names when the findings could not be counted.
 constexpr const char* kSummary = "summary";
 constexpr const char* kNoMemoryForSummary = "not enough memory to count the findings";
 
@@ -69,15 +73,17 @@ class ComparisonRun {
       : config_(config),
         report_("XmlDiff"),
         log_(Log::Standard()),
-        collecting_(config.summary || config.baseline_path || !config.export_paths.empty()) {}
+        collecting_(config.summary || config.baseline_path || !config.export_paths.empty()),
+        executor_(Executor::MachineThreads()) {}
 
   ExitStatus Run() {
     ReadBaseline();
     CompareInputs();
     FinishSummary();
     WriteOutputs();
-    // The last pair's documents are freed while the outputs are written.
-    if (discarding_.valid()) discarding_.get();
+    // Freed only now: unmapping large documents while the outputs are written
+    // would slow the writing down more than it takes.
+    last_pair_ = LoadedPair();
     if (config_.summary) WriteSummaryLine();
     if (incomplete_) return ExitStatus::kIncomplete;
     if (config_.fail && summary_.failed) return ExitStatus::kFindingsNotAccepted;
@@ -100,9 +106,12 @@ class ComparisonRun {
 
   void CompareInputs() {
     switch (ChooseInputMode(config_.reference_path, config_.checked_path)) {
-      case InputMode::kFilePair:
-        ComparePair(LoadPair(config_.reference_path, config_.checked_path, KeepOriginals()));
+      case InputMode::kFilePair: {
+        std::vector<PairReader::Paths> pair;
+        pair.push_back(DocumentPair(config_.reference_path, config_.checked_path));
+        ComparePairs(std::move(pair));
         return;
+      }
       case InputMode::kDirectoryPair:
         CompareDirectories();
         return;
@@ -157,13 +166,25 @@ class ComparisonRun {
       return;
     }
     for (std::string& name : missing) summary_.missing_documents.emplace_back(std::move(name));
-    PairReader reader(std::move(pairs), KeepOriginals());
-    while (reader.HasNext()) ComparePair(reader.Next());
+    ComparePairs(std::move(pairs));
+  }
+
+  void ComparePairs(std::vector<PairReader::Paths> pairs) {
+    PairReader reader(std::move(pairs), KeepOriginals(), executor_);
+    while (reader.HasNext()) {
+      LoadedPair pair = reader.Next();
+      ComparePair(pair);
+      if (reader.HasNext()) {
+        Discard(std::move(pair));
+      } else {
+        last_pair_ = std::move(pair);
+      }
+    }
   }
 
   // Both documents are read even when the first fails, so that every fault
   // is reported in one run, the reference document's first.
-  void ComparePair(LoadedPair pair) {
+  void ComparePair(const LoadedPair& pair) {
     ReportLoadFault(pair.reference);
     ReportLoadFault(pair.checked);
     if (pair.reference.document && pair.checked.document) {
@@ -171,7 +192,8 @@ class ComparisonRun {
       FindingCollector collector(&pair.reference.originals, &pair.checked.originals,
                                  config_.baseline_path.has_value());
       CompareFrameworks(pair.reference.document->root(), pair.checked.document->root(),
-                        config_.settings, report_, log_, collecting_ ? &collector : nullptr);
+                        config_.settings, report_, log_, collecting_ ? &collector : nullptr,
+                        &executor_);
       // The findings hold copies of the values they show, never pointers into
       // the documents.
       findings_.insert(findings_.end(), std::make_move_iterator(collector.findings().begin()),
@@ -183,17 +205,17 @@ class ComparisonRun {
     } else {
       ++summary_.pairs_skipped;
     }
-    Discard(std::move(pair));
   }
 
   // Giving the memory of large documents back to the system takes a while, so
-  // it is done on another thread while the run goes on. The report holds
-  // copies of the values it mirrors, never pointers into the documents.
+  // it is done by a task while the run goes on; a small pair costs less to
+  // free than to hand over. The report holds copies of the values it mirrors,
+  // never pointers into the documents.
   void Discard(LoadedPair pair) {
-    if (discarding_.valid()) discarding_.get();
+    static constexpr uintmax_t kFreedHereBytes = uintmax_t{4} << 20;
+    if (pair.bytes < kFreedHereBytes) return;
     // The pair is moved into the task's body, so that it is freed there.
-    discarding_ = RunInBackground(
-        [pair = std::move(pair)]() mutable { LoadedPair discarded = std::move(pair); });
+    executor_.Post([pair = std::move(pair)]() mutable { LoadedPair discarded = std::move(pair); });
   }
 
   void ReportLoadFault(const LoadedDocument& loaded) {
@@ -264,14 +286,19 @@ class ComparisonRun {
     }
   }
 
-  // The report and the help page, and meanwhile the exports, each on a thread
-  // of its own; they only read the findings, which no longer change.
+  // The report and the help page, and meanwhile the exports, each by a task;
+  // they only read the findings, which no longer change.
   void WriteOutputs() {
-    run_ = RunDescription{kToolVersion,          config_.reference_path, config_.checked_path,
-                          config_.output_path,   config_.items,          config_.export_paths,
-                          config_.markdown_full, config_.sarif_base};
+    run_ = RunDescription{std::string("zor2check ") + kVersion,
+                          config_.reference_path,
+                          config_.checked_path,
+                          config_.output_path,
+                          config_.items,
+                          config_.export_paths,
+                          config_.markdown_full,
+                          config_.sarif_base};
     WriteExports(
-        config_.export_paths, run_, findings_, &summary_,
+        config_.export_paths, run_, findings_, &summary_, executor_,
         [this] {
           WriteReport();
           WriteHelpPage();
@@ -310,7 +337,9 @@ class ComparisonRun {
   std::optional<Baseline> baseline_;
   RunDescription run_;  // what the exports say was run
   bool incomplete_ = false;
-  std::future<void> discarding_;  // frees the documents of the last pair
+  LoadedPair last_pair_;  // freed once the outputs are written
+  // Last, so that it ends first: its tasks may use the members above.
+  Executor executor_;
 };
 
 }  // namespace

@@ -1,11 +1,9 @@
 #include "driver/export_writing.h"
 
-#include <future>
 #include <memory>
 #include <new>
 
 #include "documents/exports.h"
-#include "platform/tools/background.h"
 #include "platform/tools/file_output.h"
 
 namespace zor2 {
@@ -29,7 +27,7 @@ std::string MakeAndWrite(const std::string& path, const RunDescription& run,
 }  // namespace
 
 void WriteExports(const std::vector<std::string>& paths, const RunDescription& run,
-                  const std::vector<Finding>& findings, RunSummary* summary,
+                  const std::vector<Finding>& findings, RunSummary* summary, Executor& executor,
                   const std::function<void()>& write_others, const FailureReport& report_failure) {
   std::vector<const std::string*> pending;
   for (const std::string& path : paths) pending.push_back(&path);
@@ -44,9 +42,9 @@ void WriteExports(const std::vector<std::string>& paths, const RunDescription& r
       for (const std::string* path : pending) report_failure(*path, kNoMemory);
       break;
     }
-    std::vector<std::future<std::string>> tasks;
+    std::vector<Executor::Handle<std::string>> tasks;
     for (const std::string* path : pending) {
-      tasks.push_back(RunInBackground([path, &run, summary = stated.get(), &findings] {
+      tasks.push_back(executor.Submit([path, &run, summary = stated.get(), &findings] {
         return MakeAndWrite(*path, run, *summary, findings);
       }));
     }
@@ -56,7 +54,7 @@ void WriteExports(const std::vector<std::string>& paths, const RunDescription& r
     }
     std::vector<const std::string*> written;
     for (size_t i = 0; i < tasks.size(); ++i) {
-      const std::string err = tasks[i].get();
+      const std::string err = tasks[i].Get();
       if (err.empty()) {
         written.push_back(pending[i]);
       } else {

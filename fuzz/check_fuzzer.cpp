@@ -17,6 +17,7 @@
 #include <string_view>
 
 #include "documents/type_name_normalization.h"
+#include "documents/value_preparation.h"
 #include "driver/pair_loading.h"
 #include "platform/tools/log.h"
 #include "platform/tools/xml_escaping.h"

@@ -2,6 +2,7 @@
 
 #include "rules/child_elements.h"
 #include "rules/method_comparison.h"
+#include "rules/method_lists.h"
 #include "rules/new_pure_virtual_methods.h"
 #include "rules/pairing_index.h"
 
@@ -26,8 +27,14 @@ void CompareClasses(const xml::Element& reference, const xml::Element& checked,
       continue;
     }
     report_class.SetCounterpart(counterpart);
-    CompareMethods(*cls, *counterpart, settings, report_class, log);
-    if (check_new_pure_virtual) CheckNewPureVirtualMethods(*cls, *counterpart, report_class, log);
+    // Read once for both method rules.
+    const std::vector<MethodRecord> reference_methods = ReadClassMethods(*cls);
+    const std::vector<MethodRecord> checked_methods = ReadClassMethods(*counterpart);
+    CompareMethods(*cls, *counterpart, reference_methods, checked_methods, settings, report_class,
+                   log);
+    if (check_new_pure_virtual) {
+      CheckNewPureVirtualMethods(reference_methods, checked_methods, report_class, log);
+    }
   }
 }
 

@@ -1,12 +1,12 @@
 #include "rules/framework_comparison.h"
 
+#include <algorithm>
 #include <atomic>
 #include <iterator>
 #include <memory>
 #include <optional>
 #include <vector>
 
-#include "platform/tools/background.h"
 #include "rules/child_elements.h"
 #include "rules/file_comparison.h"
 #include "rules/pairing_index.h"
@@ -66,7 +66,7 @@ void CommitDone(std::vector<FrameworkPair>& pairs, size_t& committed, xml::Outpu
 
 void CompareFrameworks(const xml::Element& reference, const xml::Element& checked,
                        const CheckSettings& settings, xml::OutputElement& report, Log& log,
-                       FindingCollector* collector) {
+                       FindingCollector* collector, Executor* executor) {
   const NameIndex checked_frameworks(ChildElements(checked, "Framework"));
   std::vector<const xml::Element*> references;
   std::vector<const xml::Element*> counterparts;
@@ -93,14 +93,22 @@ void CompareFrameworks(const xml::Element& reference, const xml::Element& checke
   auto work = [&pairs, &next, &settings] {
     for (size_t i; (i = next++) < pairs.size();) ComparePair(pairs[i], settings);
   };
-  std::future<void> helper;
-  if (pairs.size() > 1) helper = RunInBackground(work);
+  // As many helpers as the machine has other processors; a helper that no
+  // worker has started by the end runs here and finds nothing left.
+  std::vector<Executor::Handle<void>> helpers;
+  if (executor != nullptr) {
+    const size_t wanted =
+        pairs.size() > 1 ? std::min(Executor::MachineThreads(), pairs.size()) - 1 : 0;
+    for (size_t h = 0; h < std::min(wanted, executor->threads()); ++h) {
+      helpers.push_back(executor->Submit(work));
+    }
+  }
   size_t committed = 0;
   for (size_t i; (i = next++) < pairs.size();) {
     ComparePair(pairs[i], settings);
     CommitDone(pairs, committed, report, log, collector);
   }
-  if (helper.valid()) helper.get();
+  for (Executor::Handle<void>& helper : helpers) helper.Get();
   CommitDone(pairs, committed, report, log, collector);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/tools/executor.h"
 #include "platform/tools/log.h"
 #include "platform/xml/document.h"
 #include "platform/xml/output_element.h"
@@ -13,13 +14,14 @@ namespace zor2 {
 // then the "Protected" interface groups, recording the findings under
 // `report`, each under the mirrors of the reference elements that lead to it.
 // A reference framework without counterpart is passed over (and named to the
-// collector, when there is one). The framework
-// pairs are compared on two threads when there are several; the report and
-// the lines written to `log` come out in reference order all the same. With a
-// `collector`, every finding is also collected there, in report order, and
-// the reference files that passed the file filter are counted there.
+// collector, when there is one). The framework pairs are compared on the
+// calling thread and, given an `executor`, on as many of its workers as there
+// are other processors; the report and the lines written to `log` come out in
+// reference order all the same. With a `collector`, every finding is also
+// collected there, in report order, and the reference files that passed the
+// file filter are counted there.
 void CompareFrameworks(const xml::Element& reference, const xml::Element& checked,
                        const CheckSettings& settings, xml::OutputElement& report, Log& log,
-                       FindingCollector* collector = nullptr);
+                       FindingCollector* collector = nullptr, Executor* executor = nullptr);
 
 }  // namespace zor2

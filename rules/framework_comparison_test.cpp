@@ -31,8 +31,9 @@ TEST(FrameworkComparisonTest, KeepsReferenceOrderAcrossManyFrameworks) {
   auto checked_document = testing::Parse(checked + "</W>");
   xml::OutputElement report("XmlDiff");
   Log log;
+  Executor executor(4);
   CompareFrameworks(reference_document->root(), checked_document->root(), CheckSettings(), report,
-                    log);
+                    log, nullptr, &executor);
   ::testing::internal::CaptureStdout();
   log.ReplayInto(Log::Standard());
   EXPECT_EQ(::testing::internal::GetCapturedStdout(), expected_log);

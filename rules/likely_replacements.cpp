@@ -1,7 +1,6 @@
 #include "rules/likely_replacements.h"
 
 #include <algorithm>
-#include <cstring>
 #include <iterator>
 
 namespace zor2 {
@@ -42,12 +41,9 @@ void Nearest(const Sorted& sorted, size_t at, std::string_view text, size_t coun
 void LikelyReplacements::BuildIndex() {
   indexed_ = true;
   size_t order = 0;
-  for (const xml::Element* child = class_.first_child(); child; child = child->next_sibling()) {
-    if (std::strcmp(child->tag(), "Method") != 0) continue;
-    const char* name = child->FindAttribute("Name");
-    const char* signature = child->FindAttribute("Signature");
-    if (name == nullptr || signature == nullptr) continue;
-    by_name_[name].by_start.push_back({signature, order++});
+  for (const MethodRecord& method : methods_) {
+    if (method.name == nullptr || method.signature == nullptr) continue;
+    by_name_[method.name].by_start.push_back({method.signature, order++});
   }
   for (auto& [name, overloads] : by_name_) {
     std::vector<Method>& by_start = overloads.by_start;

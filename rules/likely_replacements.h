@@ -6,26 +6,29 @@
 #include <unordered_map>
 #include <vector>
 
-#include "platform/xml/document.h"
 #include "rules/finding.h"
+#include "rules/method_records.h"
 
 namespace zor2 {
 
-// The likely replacements of a deleted method: the "Method" elements of the
-// checked class that bear its name, as a finding shows them. A class may hold
+// The likely replacements of a deleted method: the methods of the checked
+// class that bear its name, as a finding shows them. A class may hold
 // thousands of overloads of one name, each deleted one asking: the list is
 // capped at kShown signatures, the most alike, and counts the rest, so that
 // time, memory and the exports grow with the findings, not with their
 // product. The index is built on the first question, which only runs that
 // collect findings ask.
 //
-// Thread safety: used by one thread; reads the document, which must outlive
-// it.
+// Thread safety: used by one thread; reads the records it is given and their
+// document, which must outlive it.
 class LikelyReplacements {
  public:
   static constexpr size_t kShown = 10;
 
-  explicit LikelyReplacements(const xml::Element& checked_class) : class_(checked_class) {}
+  // `checked_methods`: the records of the checked class's "Method" children,
+  // in document order (ReadClassMethods).
+  explicit LikelyReplacements(const std::vector<MethodRecord>& checked_methods)
+      : methods_(checked_methods) {}
   LikelyReplacements(const LikelyReplacements&) = delete;
   LikelyReplacements& operator=(const LikelyReplacements&) = delete;
 
@@ -52,7 +55,7 @@ class LikelyReplacements {
   };
   void BuildIndex();
 
-  const xml::Element& class_;
+  const std::vector<MethodRecord>& methods_;
   bool indexed_ = false;
   std::unordered_map<std::string_view, Overloads> by_name_;
 };

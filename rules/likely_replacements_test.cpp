@@ -4,7 +4,9 @@
 
 #include <algorithm>
 #include <string>
+#include <vector>
 
+#include "rules/method_lists.h"
 #include "tests/test_util.h"
 
 namespace zor2 {
@@ -23,7 +25,8 @@ TEST(LikelyReplacementsTest, ShowsTheMostAlikeOfManyInTheirOrder) {
   cls += "<Method Name=\"Other\" Signature=\"void Move(double dx, double dy)\"/></Class>";
   const auto document = testing::Parse(cls);
   const FindingCollector shown(nullptr, nullptr, false);
-  LikelyReplacements replacements(document->root());
+  const std::vector<MethodRecord> methods = ReadClassMethods(document->root());
+  LikelyReplacements replacements(methods);
 
   int more = -1;
   const std::string shown_list =

@@ -100,7 +100,9 @@ void CompareMethodPair(const MethodRecord& m, size_t i, const MethodRecord& n, s
 }  // namespace
 
 void CompareMethods(const xml::Element& reference, const xml::Element& checked,
-                    const CheckSettings& settings, ReportMirror& report, Log& log) {
+                    const std::vector<MethodRecord>& reference_methods,
+                    const std::vector<MethodRecord>& checked_methods, const CheckSettings& settings,
+                    ReportMirror& report, Log& log) {
   const char* reference_aut = reference.FindAttribute("Aut");
   const char* checked_aut = checked.FindAttribute("Aut");
   if (StartsWith(reference_aut, 'Y') && StartsWith(checked_aut, 'N')) {
@@ -109,18 +111,18 @@ void CompareMethods(const xml::Element& reference, const xml::Element& checked,
     });
   }
 
-  const std::vector<MethodRecord> reference_methods =
-      ComparableMethods(reference, ClassSide::kReference, log);
-  const std::vector<MethodRecord> checked_methods =
-      ComparableMethods(checked, ClassSide::kChecked, log);
-  if (reference_methods.empty()) return;
+  const std::vector<const MethodRecord*> reference_list =
+      ComparableMethods(reference_methods, ClassSide::kReference, log);
+  const std::vector<const MethodRecord*> checked_list =
+      ComparableMethods(checked_methods, ClassSide::kChecked, log);
+  if (reference_list.empty()) return;
 
   const bool automation = StartsWith(checked_aut, 'Y');
   bool order_reported = false;
-  const MethodIndex counterparts(checked_methods);
-  LikelyReplacements replacements(checked);
-  for (size_t i = 0; i < reference_methods.size(); ++i) {
-    const MethodRecord& m = reference_methods[i];
+  const MethodIndex counterparts(checked_list);
+  LikelyReplacements replacements(checked_methods);
+  for (size_t i = 0; i < reference_list.size(); ++i) {
+    const MethodRecord& m = *reference_list[i];
     if (PassedOverAsDeprecated(m, settings.current_level)) continue;
     const size_t j = counterparts.Find(m);
     ReportMirror report_method(report, "Method");
@@ -133,8 +135,8 @@ void CompareMethods(const xml::Element& reference, const xml::Element& checked,
       });
       continue;
     }
-    report_method.SetCounterpart(checked_methods[j].element);
-    CompareMethodPair(m, i, checked_methods[j], j, automation, order_reported, report_method, log);
+    report_method.SetCounterpart(checked_list[j]->element);
+    CompareMethodPair(m, i, *checked_list[j], j, automation, order_reported, report_method, log);
   }
 }
 

@@ -1,8 +1,11 @@
 #pragma once
 
+#include <vector>
+
 #include "platform/tools/log.h"
 #include "platform/xml/document.h"
 #include "rules/check_settings.h"
+#include "rules/method_records.h"
 #include "rules/report_mirror.h"
 
 namespace zor2 {
@@ -14,8 +17,11 @@ namespace zor2 {
 // method still there, in automation classes changed order (MOHBC, once per
 // class) and property modifier (PMHC), then new "@nodoc" (INDM), returned type
 // (MRTHC), argument default values (ADVHC, under an "Arg" element) and
-// automation return value (ARVHC, once per method).
+// automation return value (ARVHC, once per method). `reference_methods` and
+// `checked_methods` are the classes' methods (ReadClassMethods).
 void CompareMethods(const xml::Element& reference, const xml::Element& checked,
-                    const CheckSettings& settings, ReportMirror& report, Log& log);
+                    const std::vector<MethodRecord>& reference_methods,
+                    const std::vector<MethodRecord>& checked_methods, const CheckSettings& settings,
+                    ReportMirror& report, Log& log);
 
 }  // namespace zor2

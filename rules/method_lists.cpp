@@ -14,48 +14,54 @@ bool IsPublicOrProtected(const char* access) {
   return std::strcmp(access, "Public") == 0 || std::strcmp(access, "Protected") == 0;
 }
 
-// Calls `visit` with the record of each "Method" child of `cls`, in order,
-// holding its attributes only: the arguments of a method that is kept are
-// read then.
-template <typename Visit>
-void ForEachMethod(const xml::Element& cls, Visit visit) {
-  for (const xml::Element* child = cls.first_child(); child; child = child->next_sibling()) {
-    if (std::strcmp(child->tag(), "Method") == 0) visit(ReadMethodAttributes(*child));
-  }
-}
-
-void Keep(std::vector<MethodRecord>& methods, MethodRecord&& method) {
-  ReadArguments(method);
-  methods.push_back(std::move(method));
+bool IsPureVirtual(const char* type) {
+  return type != nullptr && std::strcmp(type, "PureVirtual") == 0;
 }
 
 }  // namespace
 
-std::vector<MethodRecord> ComparableMethods(const xml::Element& cls, ClassSide side, Log& log) {
+std::vector<MethodRecord> ReadClassMethods(const xml::Element& cls) {
   std::vector<MethodRecord> methods;
-  ForEachMethod(cls, [&](MethodRecord&& method) {
-    if (method.signature != nullptr && method.access != nullptr) {
-      if (IsPublicOrProtected(method.access)) Keep(methods, std::move(method));
-      return;
+  for (const xml::Element* child = cls.first_child(); child; child = child->next_sibling()) {
+    if (std::strcmp(child->tag(), "Method") != 0) continue;
+    methods.push_back(ReadMethodAttributes(*child));
+    // Only the methods that a list keeps are compared by their arguments.
+    MethodRecord& method = methods.back();
+    if (method.signature != nullptr && method.access != nullptr &&
+        (IsPublicOrProtected(method.access) || IsPureVirtual(method.type))) {
+      ReadArguments(method);
     }
-    if (method.signature == nullptr) LogMissing("signature", method, side, log);
-    if (method.access == nullptr) LogMissing("Access", method, side, log);
-  });
+  }
   return methods;
 }
 
-std::vector<MethodRecord> PureVirtualMethods(const xml::Element& cls, ClassSide side, Log& log) {
-  std::vector<MethodRecord> methods;
-  ForEachMethod(cls, [&](MethodRecord&& method) {
+std::vector<const MethodRecord*> ComparableMethods(const std::vector<MethodRecord>& methods,
+                                                   ClassSide side, Log& log) {
+  std::vector<const MethodRecord*> kept;
+  for (const MethodRecord& method : methods) {
+    if (method.signature != nullptr && method.access != nullptr) {
+      if (IsPublicOrProtected(method.access)) kept.push_back(&method);
+      continue;
+    }
+    if (method.signature == nullptr) LogMissing("signature", method, side, log);
+    if (method.access == nullptr) LogMissing("Access", method, side, log);
+  }
+  return kept;
+}
+
+std::vector<const MethodRecord*> PureVirtualMethods(const std::vector<MethodRecord>& methods,
+                                                    ClassSide side, Log& log) {
+  std::vector<const MethodRecord*> kept;
+  for (const MethodRecord& method : methods) {
     if (method.signature != nullptr && method.access != nullptr && method.type != nullptr) {
-      if (std::strcmp(method.type, "PureVirtual") == 0) Keep(methods, std::move(method));
-      return;
+      if (IsPureVirtual(method.type)) kept.push_back(&method);
+      continue;
     }
     if (method.signature == nullptr) LogMissing("signature", method, side, log);
     if (method.access == nullptr) LogMissing("Access", method, side, log);
     if (method.type == nullptr) LogMissing("Type", method, side, log);
-  });
-  return methods;
+  }
+  return kept;
 }
 
 }  // namespace zor2

@@ -5,16 +5,18 @@
 
 namespace zor2 {
 
-void CheckNewPureVirtualMethods(const xml::Element& reference, const xml::Element& checked,
+void CheckNewPureVirtualMethods(const std::vector<MethodRecord>& reference_methods,
+                                const std::vector<MethodRecord>& checked_methods,
                                 ReportMirror& report, Log& log) {
-  const std::vector<MethodRecord> reference_methods =
-      PureVirtualMethods(reference, ClassSide::kReference, log);
-  const std::vector<MethodRecord> checked_methods =
-      PureVirtualMethods(checked, ClassSide::kChecked, log);
-  if (checked_methods.empty()) return;
+  const std::vector<const MethodRecord*> reference_list =
+      PureVirtualMethods(reference_methods, ClassSide::kReference, log);
+  const std::vector<const MethodRecord*> checked_list =
+      PureVirtualMethods(checked_methods, ClassSide::kChecked, log);
+  if (checked_list.empty()) return;
 
-  const MethodIndex declared(reference_methods);
-  for (const MethodRecord& n : checked_methods) {
+  const MethodIndex declared(reference_list);
+  for (const MethodRecord* method : checked_list) {
+    const MethodRecord& n = *method;
     if (declared.Contains(n)) continue;
     ReportMirror report_method(report, "Method");
     MirrorMethod(report_method, n);

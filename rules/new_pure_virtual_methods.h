@@ -1,7 +1,9 @@
 #pragma once
 
+#include <vector>
+
 #include "platform/tools/log.h"
-#include "platform/xml/document.h"
+#include "rules/method_records.h"
 #include "rules/report_mirror.h"
 
 namespace zor2 {
@@ -10,8 +12,10 @@ namespace zor2 {
 // pure virtual method of the checked class that the reference class does not
 // declare as pure virtual with the same identity (name, access, argument
 // types). Methods that lack "Signature", "Access" or "Type" are left out and
-// named on the warning log.
-void CheckNewPureVirtualMethods(const xml::Element& reference, const xml::Element& checked,
+// named on the warning log. `reference_methods` and `checked_methods` are the
+// classes' methods (ReadClassMethods).
+void CheckNewPureVirtualMethods(const std::vector<MethodRecord>& reference_methods,
+                                const std::vector<MethodRecord>& checked_methods,
                                 ReportMirror& report, Log& log);
 
 }  // namespace zor2

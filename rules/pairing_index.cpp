@@ -54,10 +54,10 @@ bool SameSignature(const MethodRecord& m, const MethodRecord& n) {
 
 }  // namespace
 
-MethodIndex::MethodIndex(const std::vector<MethodRecord>& methods) : methods_(methods) {
+MethodIndex::MethodIndex(const std::vector<const MethodRecord*>& methods) : methods_(methods) {
   entries_.reserve(methods.size());
   for (size_t i = 0; i < methods.size(); ++i) {
-    if (HasIdentity(methods[i])) entries_.push_back({IdentityHash(methods[i]), i});
+    if (HasIdentity(*methods[i])) entries_.push_back({IdentityHash(*methods[i]), i});
   }
   std::sort(entries_.begin(), entries_.end());
 }
@@ -68,7 +68,7 @@ size_t MethodIndex::Find(const MethodRecord& m) const {
   auto entry = std::lower_bound(entries_.begin(), entries_.end(), Entry{hash, 0});
   size_t first = npos;
   for (; entry != entries_.end() && entry->hash == hash; ++entry) {
-    const MethodRecord& n = methods_[entry->position];
+    const MethodRecord& n = *methods_[entry->position];
     if (!SameMethod(m, n)) continue;
     if (SameSignature(m, n)) return entry->position;
     if (first == npos) first = entry->position;

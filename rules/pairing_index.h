@@ -35,7 +35,7 @@ class MethodIndex {
  public:
   static constexpr size_t npos = static_cast<size_t>(-1);
 
-  explicit MethodIndex(const std::vector<MethodRecord>& methods);
+  explicit MethodIndex(const std::vector<const MethodRecord*>& methods);
   // The position (from 0) of the record n of the list that m pairs with: among
   // those for which SameMethod(m, n) holds, the first whose "Signature" is
   // m's own, else the first; npos when there is none. Const twins
@@ -53,7 +53,7 @@ class MethodIndex {
       return hash != other.hash ? hash < other.hash : position < other.position;
     }
   };
-  const std::vector<MethodRecord>& methods_;
+  const std::vector<const MethodRecord*>& methods_;
   // Ordered by hash, then by position: the records that may be the same
   // method as a given one are a run of equal hashes, in list order. One
   // allocation per index, where a hash map would make one per record.

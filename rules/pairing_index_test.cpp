@@ -40,7 +40,9 @@ TEST(MethodIndexTest, AgreesWithAScanOfTheList) {
     methods.push_back(ReadMethod(*e));
   }
 
-  const MethodIndex index(methods);
+  std::vector<const MethodRecord*> list;
+  for (const MethodRecord& m : methods) list.push_back(&m);
+  const MethodIndex index(list);
   for (const MethodRecord& m : methods) {
     size_t expected = MethodIndex::npos;
     for (size_t j = 0; j < methods.size() && expected == MethodIndex::npos; ++j) {

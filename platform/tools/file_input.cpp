@@ -8,11 +8,8 @@
 
 #include <algorithm>
 #include <cerrno>
-#include <cstdint>
 #include <cstring>
 #include <limits>
-
-#include "platform/tools/file_descriptor.h"
 
 namespace zor2 {
 namespace {
@@ -22,8 +19,8 @@ bool Refuse(FileReadError* err, int error_number) {
   return false;
 }
 
-// The most memory the process could ever hold: the machine's memory and swap,
-// or less when the process is limited.
+}  // namespace
+
 uintmax_t MemoryLimit() {
   uintmax_t limit = std::numeric_limits<uintmax_t>::max();
   struct sysinfo machine;
@@ -39,26 +36,29 @@ uintmax_t MemoryLimit() {
   return limit;
 }
 
-}  // namespace
-
-bool ReadRegularFile(const std::string& path, const ReadRoom& room, size_t* length,
-                     FileReadError* err) {
+bool OpenRegularFile(const std::string& path, uintmax_t memory_limit, FileDescriptor* file,
+                     size_t* size, FileReadError* err) {
   *err = FileReadError{};
-  FileDescriptor file(::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
-  if (!file.valid()) return Refuse(err, errno);
+  *file = FileDescriptor(::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
+  if (!file->valid()) return Refuse(err, errno);
   struct stat status;
-  if (::fstat(file.get(), &status) != 0) return Refuse(err, errno);
+  if (::fstat(file->get(), &status) != 0) return Refuse(err, errno);
   if (S_ISDIR(status.st_mode)) return Refuse(err, EISDIR);
   if (!S_ISREG(status.st_mode)) {
     err->reason = "Not a regular file";
     return false;
   }
-  if (static_cast<uintmax_t>(status.st_size) >= MemoryLimit()) {
+  if (static_cast<uintmax_t>(status.st_size) >= memory_limit) {
     err->reason = std::strerror(ENOMEM);
     err->too_large = true;
     return false;
   }
-  size_t limit = static_cast<size_t>(status.st_size) + 1;
+  *size = static_cast<size_t>(status.st_size);
+  return true;
+}
+
+bool ReadOpenFile(int file, size_t size, const ReadRoom& room, size_t* length, FileReadError* err) {
+  size_t limit = size + 1;
   char* buffer = room(limit, 0);
   size_t used = 0;
   for (;;) {
@@ -66,7 +66,7 @@ bool ReadRegularFile(const std::string& path, const ReadRoom& room, size_t* leng
       limit *= 2;
       buffer = room(limit, used);
     }
-    const ssize_t got = ::read(file.get(), buffer + used, limit - used);
+    const ssize_t got = ::read(file, buffer + used, limit - used);
     if (got < 0) {
       if (errno == EINTR) continue;
       return Refuse(err, errno);
@@ -76,6 +76,14 @@ bool ReadRegularFile(const std::string& path, const ReadRoom& room, size_t* leng
   }
   *length = used;
   return true;
+}
+
+bool ReadRegularFile(const std::string& path, const ReadRoom& room, size_t* length,
+                     FileReadError* err) {
+  FileDescriptor file(-1);
+  size_t size = 0;
+  return OpenRegularFile(path, MemoryLimit(), &file, &size, err) &&
+         ReadOpenFile(file.get(), size, room, length, err);
 }
 
 }  // namespace zor2

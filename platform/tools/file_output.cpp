@@ -4,55 +4,75 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <array>
 #include <atomic>
 #include <cerrno>
 #include <csignal>
 #include <cstring>
+#include <deque>
+#include <mutex>
 #include <random>
-#include <thread>
 
 #include "platform/tools/file_descriptor.h"
 
 namespace zor2 {
 namespace {
 
-// The temporary files being written, for the signal handler. A writer holds a
-// slot from before its temporary file exists until the file is renamed or
-// removed; a few outputs are written at once (the report and the exports), and
-// a writer that finds every slot taken waits for one.
-constexpr size_t kWritersAtOnce = 4;
-std::array<std::atomic<const char*>, kWritersAtOnce> temporaries_in_progress{};
-std::array<std::atomic<bool>, kWritersAtOnce> slots_taken{};
+// The temporary files being written, for the signal handler: one slot per
+// writer at work, in a list that only grows, so that the handler can walk it
+// at any moment. A writer holds a slot from before its temporary file exists
+// until the file is renamed or removed, and never waits for one: when every
+// slot is taken, it adds one.
+struct Slot {
+  std::atomic<const char*> temporary{nullptr};
+  std::atomic<bool> taken{false};
+  Slot* next = nullptr;  // set before the slot joins the list, then never changed
+};
+std::atomic<Slot*> slots{nullptr};
 static_assert(std::atomic<const char*>::is_always_lock_free, "read by a signal handler");
+static_assert(std::atomic<Slot*>::is_always_lock_free, "read by a signal handler");
+
+// A slot that no writer holds, added to the list when there is none.
+Slot& TakeSlot() {
+  for (Slot* slot = slots.load(); slot != nullptr; slot = slot->next) {
+    if (!slot->taken.exchange(true)) return *slot;
+  }
+  // Slots never move or go, for the handler's sake.
+  static std::mutex adding;
+  static std::deque<Slot> added;
+  std::lock_guard<std::mutex> lock(adding);
+  Slot& slot = added.emplace_back();
+  slot.taken.store(true);
+  slot.next = slots.load();
+  slots.store(&slot);
+  return slot;
+}
 
 // One writer's slot, given back when it goes.
 class TemporarySlot {
  public:
-  TemporarySlot() {
-    for (;;) {
-      for (index_ = 0; index_ < kWritersAtOnce; ++index_) {
-        if (!slots_taken[index_].exchange(true)) return;
-      }
-      std::this_thread::yield();
-    }
-  }
+  TemporarySlot() : slot_(TakeSlot()) {}
   TemporarySlot(const TemporarySlot&) = delete;
   TemporarySlot& operator=(const TemporarySlot&) = delete;
   ~TemporarySlot() {
     Publish(nullptr);
-    slots_taken[index_].store(false);
+    slot_.taken.store(false);
   }
   // REQUIRES: `path` stays valid until the next Publish.
-  void Publish(const char* path) { temporaries_in_progress[index_].store(path); }
+  void Publish(const char* path) { slot_.temporary.store(path); }
 
  private:
-  size_t index_;
+  Slot& slot_;
 };
 
+// What the names of temporary files start with.
+std::string& TemporaryPrefix() {
+  static std::string prefix = ".zor2check.";
+  return prefix;
+}
+
 extern "C" void EndInterruptedRun(int signal_number) {
-  for (const std::atomic<const char*>& slot : temporaries_in_progress) {
-    if (const char* temporary = slot.load()) ::unlink(temporary);
+  for (const Slot* slot = slots.load(); slot != nullptr; slot = slot->next) {
+    if (const char* temporary = slot->temporary.load()) ::unlink(temporary);
   }
   // The handler was reset on entry: ending by the signal itself tells the
   // parent how the run ended (a shell shows 128 and its number).
@@ -84,8 +104,8 @@ std::string DirectoryOf(const std::string& path) {
 
 // Creates a new file in the directory of `path`, with `mode` (less the
 // umask); sets `temporary` to its name. The name is short and hidden,
-// ".zor2check." and six random letters, so that it fits wherever `path`'s
-// name fits and stays out of listings.
+// ".zor2check." (or the program's own name) and six random letters, so that it fits wherever
+// `path`'s name fits and stays out of listings.
 FileDescriptor CreateTemporary(const std::string& path, mode_t mode, TemporarySlot& slot,
                                std::string* temporary) {
   static constexpr char kLetters[] =
@@ -94,7 +114,7 @@ FileDescriptor CreateTemporary(const std::string& path, mode_t mode, TemporarySl
   std::random_device seed;
   std::minstd_rand random(seed());
   for (int attempt = 0; attempt < 100; ++attempt) {
-    std::string name = directory + ".zor2check.";
+    std::string name = directory + TemporaryPrefix();
     for (int i = 0; i < 6; ++i) name += kLetters[random() % (sizeof kLetters - 1)];
     // Published before it exists, so that no signal can leave it behind.
     slot.Publish(nullptr);
@@ -133,6 +153,12 @@ bool FinalTarget(const std::string& path, std::string* target) {
   }
   errno = ELOOP;
   return false;
+}
+
+void NameTemporaryFilesAfter(std::string_view program) {
+  std::string prefix(".");
+  prefix.append(program).append(".");
+  TemporaryPrefix() = std::move(prefix);
 }
 
 bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,

@@ -26,6 +26,11 @@ bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* 
 // cannot be read or the links loop.
 bool FinalTarget(const std::string& path, std::string* target);
 
+// Names the temporary files of the outputs after `program` ("." + program +
+// "." and six random letters); they are zor2check's otherwise. Call once,
+// before any output is written.
+void NameTemporaryFilesAfter(std::string_view program);
+
 // Makes SIGINT and SIGTERM (unless ignored from the start) remove the
 // temporary file being written before the process ends by the signal, and
 // makes a write past the file size limit fail with EFBIG rather than end the

@@ -4,8 +4,12 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <atomic>
 #include <filesystem>
 #include <iterator>
+#include <string>
+#include <thread>
+#include <vector>
 
 #include "tests/test_util.h"
 
@@ -34,6 +38,26 @@ TEST_F(FileOutputTest, ReplacesFilesKeepingTheirModeAndWritesThroughLinks) {
   EXPECT_TRUE(S_ISLNK(status.st_mode));
   EXPECT_EQ(Contents(path), "through");
   EXPECT_EQ(std::distance(std::filesystem::directory_iterator(dir_), {}), 2);
+}
+
+// Any number of outputs may be written at once (a run with many exports):
+// none waits for another, and each ends whole.
+TEST_F(FileOutputTest, WritesManyOutputsAtOnce) {
+  std::vector<std::thread> writers;
+  std::atomic<int> written{0};
+  for (int i = 0; i < 16; ++i) {
+    writers.emplace_back([this, i, &written] {
+      std::string err;
+      const std::string text(100000, static_cast<char>('a' + i));
+      if (WriteFileAtomically(Path(std::to_string(i)), text, nullptr, &err)) ++written;
+    });
+  }
+  for (std::thread& writer : writers) writer.join();
+  EXPECT_EQ(written, 16);
+  for (int i = 0; i < 16; ++i) {
+    EXPECT_EQ(Contents(Path(std::to_string(i))), std::string(100000, static_cast<char>('a' + i)));
+  }
+  EXPECT_EQ(std::distance(std::filesystem::directory_iterator(dir_), {}), 16);
 }
 
 }  // namespace

@@ -77,9 +77,9 @@ size_t DecodeCharacterReference(std::string_view ref, std::string* out) {
   return pos + 1;
 }
 
-// Decodes the reference at the start of `ref` (the text after "&") into
-// `out`; returns the length consumed, 0 when there is nothing to decode.
-size_t DecodeReference(std::string_view ref, std::string* out) {
+}  // namespace
+
+size_t AppendDecodedReference(std::string_view ref, std::string* out) {
   static const struct {
     std::string_view name;
     char c;
@@ -93,8 +93,6 @@ size_t DecodeReference(std::string_view ref, std::string* out) {
   }
   return 0;
 }
-
-}  // namespace
 
 void AppendEscaped(std::string_view value, std::string* out) {
   // Most values hold nothing to escape: they are appended in one piece.
@@ -118,7 +116,7 @@ bool DecodeXmlReferences(std::string_view value, std::string* rewritten) {
   bool changed = false;
   for (size_t from = amp; (amp = value.find('&', from)) != std::string_view::npos;) {
     std::string decoded;
-    size_t length = DecodeReference(value.substr(amp + 1), &decoded);
+    const size_t length = AppendDecodedReference(value.substr(amp + 1), &decoded);
     if (length == 0) {
       from = amp + 1;
       continue;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
 #include <string_view>
 
@@ -18,5 +19,11 @@ void AppendEscaped(std::string_view value, std::string* out);
 // holds something to decode, fills `rewritten` and returns true; otherwise
 // returns false and leaves `rewritten` alone.
 bool DecodeXmlReferences(std::string_view value, std::string* rewritten);
+
+// Decodes the one reference that `after_amp` (the text after an "&") begins
+// with, as DecodeXmlReferences would, appending what it stands for to `out`.
+// Returns the length of the reference's text after the "&", or 0 (and appends
+// nothing) when there is none to decode there.
+size_t AppendDecodedReference(std::string_view after_amp, std::string* out);
 
 }  // namespace zor2

@@ -1,19 +1,42 @@
 #include "platform/xml/document.h"
 
+#include <sys/mman.h>
+#include <unistd.h>
+
 #include <algorithm>
-#include <climits>
-#include <cstdint>
 #include <cstring>
 #include <functional>
-#include <iterator>
 #include <new>
+#include <string>
+#include <type_traits>
 #include <vector>
 
 namespace zor2::xml {
 
-// Three pointers: a parsed attribute costs nothing beyond its text, and an
-// element nothing beyond this.
-static_assert(sizeof(void*) != 8 || sizeof(Element) == 24);
+static_assert(sizeof(void*) != 8 || sizeof(Element) == 12);
+static_assert(std::is_trivially_destructible_v<Element>, "elements are unmapped, not destroyed");
+
+ElementStore::~ElementStore() {
+  if (elements_ != nullptr) ::munmap(elements_, capacity_ * sizeof(Element));
+}
+
+size_t ElementStore::Add(const char* block) {
+  if (size_ == capacity_) {
+    // Whole pages, doubled each time; the links are distances, so moving the
+    // pages moves nothing else.
+    const size_t page = static_cast<size_t>(::sysconf(_SC_PAGESIZE));
+    const size_t old_bytes = capacity_ * sizeof(Element);
+    const size_t new_bytes = old_bytes == 0 ? 16 * page : 2 * old_bytes;
+    void* grown = elements_ == nullptr ? ::mmap(nullptr, new_bytes, PROT_READ | PROT_WRITE,
+                                                MAP_PRIVATE | MAP_ANONYMOUS, -1, 0)
+                                       : ::mremap(elements_, old_bytes, new_bytes, MREMAP_MAYMOVE);
+    if (grown == MAP_FAILED || size_ >= (size_t{1} << 31)) throw std::bad_alloc();
+    elements_ = static_cast<Element*>(grown);
+    capacity_ = new_bytes / sizeof(Element);
+  }
+  ::new (&elements_[size_]) Element(block);
+  return size_++;
+}
 
 void Element::FindAttributes(std::span<const std::string_view> names,
                              std::span<const char*> values) const {
@@ -22,11 +45,10 @@ void Element::FindAttributes(std::span<const std::string_view> names,
   // starts after the name found last, since callers mostly ask in the order
   // in which elements hold their attributes.
   size_t next = 0;
-  BlockAttributes walk(block_);
+  BlockAttributes walk(block());
   std::string_view name;
   std::string_view value;
-  const char* slot;
-  while (walk.Next(name, value, slot)) {
+  while (walk.Next(name, value)) {
     for (size_t k = 0; k < names.size(); ++k) {
       const size_t i = next + k < names.size() ? next + k : next + k - names.size();
       if (names[i] == name) {
@@ -38,39 +60,19 @@ void Element::FindAttributes(std::span<const std::string_view> names,
   }
 }
 
-// A value rewrite over a whole document, with its scratch space.
-struct Document::RewritePass {
-  // A rewritten value that has to wait for its block to be rebuilt.
-  struct Grown {
-    const char* value;
-    size_t offset;  // in grown_text
-    size_t length;
-  };
-  ValueRewrite rewrite;
-  OriginalValues* originals;
-  // Whether the original of a changed value goes into `originals`.
-  bool Keeps(std::string_view original) const {
-    return originals != nullptr &&
-           (originals->worth_keeping_ == nullptr || originals->worth_keeping_(original));
+char* Document::PlaceBlock(std::string_view block, char*& out, const char* limit) {
+  char* place;
+  if (block.size() <= static_cast<size_t>(limit - out)) {
+    place = out;
+    out += block.size();
+  } else {
+    place = static_cast<char*>(blocks_.Allocate(block.size(), 1));
   }
-  std::string scratch;
-  std::string grown_text;
-  std::vector<Grown> grown;
-};
-
-Element* Document::NewElement(const char* block) {
-  void* memory = elements_.Allocate(sizeof(Element), alignof(Element));
-  return ::new (memory) Element(block);
+  std::memcpy(place, block.data(), block.size());
+  return place;
 }
 
-char* Document::AllocateSpare(size_t size) {
-  size_t offset = text_.size + 1 + spare_used_;
-  if (size > text_.capacity - offset) return nullptr;
-  spare_used_ += size;
-  return text_.data() + offset;
-}
-
-void OriginalValues::Add(const char* value, std::string_view original, bool in_place) {
+void OriginalValues::Add(const char* value, std::string_view original, bool in_text) {
   constexpr size_t kChunkSize = size_t{1} << 20;
   if (original.size() + 1 > left_) {
     left_ = std::max(kChunkSize, original.size() + 1);
@@ -79,7 +81,7 @@ void OriginalValues::Add(const char* value, std::string_view original, bool in_p
   }
   std::memcpy(next_, original.data(), original.size());
   next_[original.size()] = '\0';
-  (in_place ? in_place_ : moved_).push_back({value, next_});
+  (in_text ? in_text_ : out_of_line_).push_back({value, next_});
   next_ += original.size() + 1;
   left_ -= original.size() + 1;
 }
@@ -89,17 +91,16 @@ void OriginalValues::Seal() {
   auto before = [](const Entry& a, const Entry& b) {
     return std::less<const char*>()(a.value, b.value);
   };
-  if (!std::is_sorted(in_place_.begin(), in_place_.end(), before)) {
-    std::sort(in_place_.begin(), in_place_.end(), before);
-  }
-  if (!std::is_sorted(moved_.begin(), moved_.end(), before)) {
-    std::sort(moved_.begin(), moved_.end(), before);
+  for (std::deque<Entry>* run : {&in_text_, &out_of_line_}) {
+    if (!std::is_sorted(run->begin(), run->end(), before)) {
+      std::sort(run->begin(), run->end(), before);
+    }
   }
 }
 
 void OriginalValues::Clear() {
-  in_place_.clear();
-  moved_.clear();
+  in_text_.clear();
+  out_of_line_.clear();
   chunks_.clear();
   next_ = nullptr;
   left_ = 0;
@@ -107,7 +108,7 @@ void OriginalValues::Clear() {
 
 std::optional<std::string_view> OriginalValues::Find(const char* value) const {
   if (may_be_kept_ != nullptr && !may_be_kept_(value)) return std::nullopt;
-  for (const std::deque<Entry>* run : {&in_place_, &moved_}) {
+  for (const std::deque<Entry>* run : {&in_text_, &out_of_line_}) {
     auto entry = std::lower_bound(
         run->begin(), run->end(), value,
         [](const Entry& e, const char* v) { return std::less<const char*>()(e.value, v); });
@@ -116,140 +117,51 @@ std::optional<std::string_view> OriginalValues::Find(const char* value) const {
   return std::nullopt;
 }
 
+// Each block whose values change is written anew: in its own place when it
+// does not grow, else in the block arena.
 void Document::RewriteValues(ValueRewrite rewrite, OriginalValues* originals) {
-  RewritePass pass{rewrite, originals, {}, {}, {}};
-  if (originals != nullptr) {
-    // The originals are the values as this pass found them.
-    originals->Clear();
+  if (originals != nullptr) originals->Clear();  // the values as this pass finds them
+  std::string block;
+  std::string rewritten;
+  struct Kept {
+    size_t offset;         // of the value in `block`
+    std::string original;  // copied: the old block may be overwritten
+  };
+  std::vector<Kept> kept;
+  // The array is in document order.
+  for (size_t i = 0; i < elements_.size(); ++i) {
+    Element* element = &elements_[i];
+    const char* old_block = element->block();
+    block.assign(old_block, std::strlen(old_block) + 1);
+    kept.clear();
+    bool changed = false;
+    BlockAttributes walk(old_block);
+    std::string_view name;
+    std::string_view value;
+    while (walk.Next(name, value)) {
+      block.append(name.data(), name.size() + 1);
+      std::string_view text = value;
+      rewritten.clear();
+      if (rewrite(value, &rewritten)) {
+        text = std::string_view(rewritten.c_str());  // up to its first zero byte
+        changed = true;
+        if (originals != nullptr && originals->WorthKeeping(value)) {
+          kept.push_back({block.size(), std::string(value)});
+        }
+      }
+      block.append(text.data(), text.size());
+      block.push_back('\0');
+    }
+    block.push_back(kBlockEnd);
+    if (changed) {
+      char* in_place = const_cast<char*>(old_block);  // the document's own memory
+      const char* old_end = walk.position() + 1;
+      const char* placed = PlaceBlock(block, in_place, old_end);
+      element->set_block(placed);
+      for (const Kept& k : kept) originals->Add(placed + k.offset, k.original, placed == old_block);
+    }
   }
-  RewriteAll(pass);
   if (originals != nullptr) originals->Seal();
-}
-
-void Document::RewriteAll(RewritePass& pass) {
-  // Document order, without recursion: `open` holds the ancestors of
-  // `element`.
-  std::vector<Element*> open;
-  Element* element = root_;
-  for (;;) {
-    RewriteElement(*element, pass);
-    if (element->first_child_ != nullptr) {
-      open.push_back(element);
-      element = element->first_child_;
-      continue;
-    }
-    while (element->next_ == nullptr) {
-      if (open.empty()) return;
-      element = open.back();
-      open.pop_back();
-    }
-    element = element->next_;
-  }
-}
-
-namespace {
-
-// Values are zero-terminated strings: a rewritten text ends at its first zero.
-std::string_view UpToZero(const std::string& text) {
-  return std::string_view(text.data(), std::strlen(text.c_str()));
-}
-
-}  // namespace
-
-// A value that fits its slot in the block is rewritten in place (padded with
-// zero bytes); one that grew moves to the spare capacity after the text, or,
-// when it cannot, waits for the block to be rebuilt.
-void Document::RewriteElement(Element& element, RewritePass& pass) {
-  pass.grown.clear();
-  pass.grown_text.clear();
-  BlockAttributes walk(element.block_);
-  std::string_view name;
-  std::string_view value;
-  const char* slot;
-  while (walk.Next(name, value, slot)) {
-    pass.scratch.clear();
-    if (!pass.rewrite(value, &pass.scratch)) continue;
-    std::string_view text = UpToZero(pass.scratch);
-    size_t room = value.size();
-    if (text.size() <= room) {
-      if (pass.Keeps(value)) pass.originals->Add(value.data(), value, true);
-      char* place = const_cast<char*>(value.data());  // the document's own buffer
-      std::memcpy(place, text.data(), text.size());
-      std::memset(place + text.size(), 0, room - text.size());
-      continue;
-    }
-    // Moving overwrites the start of the slot, so the original is kept first
-    // and given its new place after.
-    const bool keep = pass.Keeps(value);
-    if (keep) pass.originals->Add(nullptr, value, false);
-    if (const char* moved = MoveValue(const_cast<char*>(slot), room, text)) {
-      if (keep) pass.originals->moved_.back().value = moved;
-      continue;
-    }
-    if (keep) pass.originals->moved_.pop_back();
-    pass.grown.push_back({value.data(), pass.grown_text.size(), text.size()});
-    pass.grown_text += text;
-  }
-  if (!pass.grown.empty()) RebuildBlock(element, pass);
-}
-
-// Gives a grown value a new home in the spare capacity after the text and
-// points its slot there. False when the slot is too small to point (values
-// under three characters) or the spare capacity is used up.
-const char* Document::MoveValue(char* slot, size_t room, std::string_view text) {
-  bool moved = *slot == kMovedValue;
-  if (!moved && room + 2 < kMovedValueSlot) return nullptr;
-  char* target = AllocateSpare(text.size() + 1);
-  // A rebuilt block lives elsewhere in memory: its slots may be out of reach.
-  if (target == nullptr || target - slot > INT32_MAX || target - slot < INT32_MIN) return nullptr;
-  std::memcpy(target, text.data(), text.size());
-  target[text.size()] = '\0';
-  if (!moved) {
-    // The quote, the value and its zero: room + 2 bytes.
-    std::memset(slot + kMovedValueSlot, 0, room + 2 - kMovedValueSlot);
-    *slot = kMovedValue;
-  }
-  int32_t offset = static_cast<int32_t>(target - slot);
-  std::memcpy(slot + 1, &offset, sizeof offset);
-  return target;
-}
-
-// Writes a new block holding the grown values into the block arena. The old
-// block stays where it is, so values handed out before remain readable.
-void Document::RebuildBlock(Element& element, RewritePass& pass) {
-  auto grown_value = [&pass](const RewritePass::Grown& grown) {
-    return std::string_view(pass.grown_text).substr(grown.offset, grown.length);
-  };
-  const char* old_block = element.block_;
-  size_t tag_size = std::strlen(old_block) + 1;
-  size_t size = tag_size + 1;  // the tag, its zero and the closing ">"
-  BlockAttributes sizing(old_block);
-  const char* name;
-  const char* value;
-  size_t next = 0;
-  while (sizing.Next(name, value)) {
-    bool grew = next < pass.grown.size() && pass.grown[next].value == value;
-    size += std::strlen(name) + 3 + (grew ? pass.grown[next++].length : std::strlen(value));
-  }
-  char* block = static_cast<char*>(blocks_.Allocate(size, 1));
-  char* out = block;
-  auto put = [&out](std::string_view text) {
-    std::memcpy(out, text.data(), text.size());
-    out += text.size();
-  };
-  put(std::string_view(old_block, tag_size));
-  BlockAttributes copying(old_block);
-  next = 0;
-  while (copying.Next(name, value)) {
-    bool grew = next < pass.grown.size() && pass.grown[next].value == value;
-    put(std::string_view(name, std::strlen(name) + 1));
-    *out++ = '"';
-    if (grew && pass.Keeps(value)) pass.originals->Add(out, value, false);
-    put(grew ? grown_value(pass.grown[next++]) : std::string_view(value));
-    *out++ = '\0';
-  }
-  *out = '>';
-  element.block_ = block;
 }
 
 }  // namespace zor2::xml

@@ -1,6 +1,8 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
+#include <cstring>
 #include <deque>
 #include <memory>
 #include <optional>
@@ -16,21 +18,25 @@ namespace zor2::xml {
 
 class Document;
 class Parser;
+class Element;
 
 // An element of a parsed document: a tag, attributes and child elements, all
 // read-only. Elements live in their document's memory and point into its text
-// (see document_storage.h); they are valid as long as their document.
+// (see document_storage.h); they are valid as long as their document. They
+// stand in document order in one array, so that an element's first child is
+// the element after it, and its next sibling is found by a distance: twelve
+// bytes an element.
 class Element {
  public:
   Element(const Element&) = delete;
   Element& operator=(const Element&) = delete;
 
-  const char* tag() const { return block_; }
-  const Element* first_child() const { return first_child_; }
-  const Element* next_sibling() const { return next_; }
+  const char* tag() const { return block(); }
+  const Element* first_child() const { return (links_ & 1) != 0 ? this + 1 : nullptr; }
+  const Element* next_sibling() const { return links_ > 1 ? this + (links_ >> 1) : nullptr; }
 
   // The value of attribute `name`, or null when the element has none.
-  const char* FindAttribute(const char* name) const { return FindBlockValue(block_, name); }
+  const char* FindAttribute(const char* name) const { return FindBlockValue(block(), name); }
   // Looks up several attributes in one walk over this element's attributes:
   // values[i] is set to what FindAttribute(names[i]) answers. Quickest when
   // `names` follow the order in which the element holds its attributes.
@@ -40,12 +46,46 @@ class Element {
  private:
   friend class Document;
   friend class Parser;
-  explicit Element(const char* block) : block_(block) {}
+  friend class ElementStore;
+  explicit Element(const char* block) { set_block(block); }
 
-  // The tag, followed by the attributes (document_storage.h).
-  const char* block_;
-  Element* next_ = nullptr;
-  Element* first_child_ = nullptr;
+  // The tag, followed by the attributes (document_storage.h), kept in two
+  // halves so that an element needs no more than four-byte alignment.
+  const char* block() const {
+    const char* block;
+    std::memcpy(&block, block_, sizeof block);
+    return block;
+  }
+  void set_block(const char* block) { std::memcpy(block_, &block, sizeof block); }
+
+  uint32_t block_[sizeof(const char*) / sizeof(uint32_t)];
+  // Bit 0: the element has children; the others: the distance to the next
+  // sibling in the array, 0 when there is none.
+  uint32_t links_ = 0;
+};
+
+// The elements of a document, in document order, in one block of memory that
+// grows without copying (its pages are remapped), so that links between
+// elements can be distances. An element's address changes as the store grows:
+// a reader holds indexes until it is done.
+class ElementStore {
+ public:
+  ElementStore() = default;
+  ElementStore(const ElementStore&) = delete;
+  ElementStore& operator=(const ElementStore&) = delete;
+  ~ElementStore();
+
+  // Adds an element whose block is `block` and returns its index. Throws
+  // std::bad_alloc when there is no memory for it.
+  size_t Add(const char* block);
+  size_t size() const { return size_; }
+  Element& operator[](size_t index) { return elements_[index]; }
+  const Element& operator[](size_t index) const { return elements_[index]; }
+
+ private:
+  Element* elements_ = nullptr;
+  size_t size_ = 0;
+  size_t capacity_ = 0;
 };
 
 // A rewrite of one attribute value: when `value` changes, fills `rewritten`
@@ -75,21 +115,26 @@ class OriginalValues {
 
  private:
   friend class Document;
+  friend class Parser;
   struct Entry {
     const char* value;     // where the rewritten value stands
     const char* original;  // zero-terminated, in chunks_
   };
-  // A pass visits values in document order, so each run comes in increasing
-  // order of place: values rewritten where they stood, and values given a new
-  // place (but for rebuilt blocks, which Seal sorts).
-  void Add(const char* value, std::string_view original, bool in_place);
+  // Whether the original of a changed value is kept.
+  bool WorthKeeping(std::string_view original) const {
+    return worth_keeping_ == nullptr || worth_keeping_(original);
+  }
+  // Values come in document order, so each run comes in increasing order of
+  // place but for blocks placed out of line, which Seal sorts: values in the
+  // document's text, and values in blocks of their own.
+  void Add(const char* value, std::string_view original, bool in_text);
   void Seal();
   void Clear();
 
   Test worth_keeping_;
   Test may_be_kept_;
-  std::deque<Entry> in_place_;
-  std::deque<Entry> moved_;
+  std::deque<Entry> in_text_;
+  std::deque<Entry> out_of_line_;
   // The original texts, in chunks that never move: no copying as they grow.
   std::vector<std::unique_ptr<char[]>> chunks_;
   char* next_ = nullptr;
@@ -109,31 +154,25 @@ class Document {
   Document(const Document&) = delete;
   Document& operator=(const Document&) = delete;
 
-  const Element& root() const { return *root_; }
+  const Element& root() const { return elements_[0]; }
 
   // Applies `rewrite` to every attribute value of every element; a rewritten
   // value replaces the old one. Values read before may be changed in place.
   // With `originals`, the old text of every value that changed is kept there.
+  // (The reader can apply a rewrite as it reads, at no extra pass: see
+  // ReadDocumentFile.)
   void RewriteValues(ValueRewrite rewrite, OriginalValues* originals = nullptr);
 
  private:
   friend class Parser;
-  struct RewritePass;
-  Element* NewElement(const char* block);
-  // `size` bytes of the text's spare capacity, or null when it is used up.
-  // Pages of a large buffer that are never used cost no memory.
-  char* AllocateSpare(size_t size);
-  void RewriteAll(RewritePass& pass);
-  void RewriteElement(Element& element, RewritePass& pass);
-  // Returns where the value now stands, or null when it could not move.
-  const char* MoveValue(char* slot, size_t room, std::string_view text);
-  void RebuildBlock(Element& element, RewritePass& pass);
 
-  TextBuffer text_;        // the document as UTF-8
-  size_t spare_used_ = 0;  // of the capacity after the text's sentinel
-  Arena elements_;
-  Arena blocks_;  // attribute blocks rebuilt for values that grew
-  Element* root_ = nullptr;
+  // Places a finished block of `size` bytes at `*out` in the text when it
+  // ends by `limit`, else in the block arena; returns where it now stands.
+  char* PlaceBlock(std::string_view block, char*& out, const char* limit);
+
+  TextBuffer text_;  // the document as UTF-8, then its blocks
+  ElementStore elements_;
+  Arena blocks_;  // blocks that did not fit in the text
 };
 
 }  // namespace zor2::xml

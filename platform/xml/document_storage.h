@@ -20,7 +20,8 @@ struct TextBuffer {
   size_t capacity = 0;
 
   // A buffer for `size` bytes (contents undefined) with the sentinel in place
-  // and `spare` more bytes of capacity.
+  // and `spare` more bytes of capacity. Pages of a large buffer that are never
+  // written cost no memory.
   static TextBuffer Allocate(size_t size, size_t spare = 0);
   char* data() const { return bytes.get(); }
 };
@@ -53,68 +54,36 @@ class Arena {
   size_t chunk_size_ = 4096;
 };
 
-// The attribute block of a parsed element. The reader leaves each start tag in
-// the buffer as
-//   tag \0 { separators name \0 [white space] [=] [white space] quote value \0 } ( ">" | "/" )
-// where separators are white space and zero bytes: the tag moved one byte left
-// over the "<", and a zero byte written over the character after each
-// attribute name and over each closing quote. No byte moves but the tag, so a
-// reading position keeps its line and column. A value shortened in place is
-// padded with zero bytes. A value that grew beyond its slot is moved to the
-// spare capacity after the text: its quote is replaced by kMovedValue and the
-// next four bytes hold the offset from that marker to the moved value (the
-// rest of the slot is zeroed). A block rebuilt elsewhere has the first form,
-// without white space.
-constexpr char kMovedValue = '\x01';
-constexpr size_t kMovedValueSlot = 5;  // the marker and the offset
-
-inline bool IsBlockSeparator(char c) {
-  return c == '\0' || c == ' ' || c == '\n' || c == '\t' || c == '\r';
-}
-
-// From just after an attribute name: finds the value's slot, sets `value`,
-// and returns the position after the value.
-inline const char* ReadBlockValue(const char* p, const char*& slot, const char*& value) {
-  while (*p != '"' && *p != '\'' && *p != kMovedValue) ++p;
-  slot = p;
-  if (*p == kMovedValue) {
-    int32_t offset;
-    std::memcpy(&offset, p + 1, sizeof offset);
-    value = p + offset;
-    return p + kMovedValueSlot;
-  }
-  value = p + 1;
-  return value + std::strlen(value);
-}
+// The attribute block of a parsed element, once its start tag has been read:
+//   tag \0 { name \0 value \0 } ">"
+// The reader writes each block over the text it has already parsed (or, when
+// a block would overtake text still to be read, into an arena of the
+// document), so that a document holds little more than its start tags.
+constexpr char kBlockEnd = '>';
 
 // Walks the attributes of a block in order.
 class BlockAttributes {
  public:
   explicit BlockAttributes(const char* block) : p_(block + std::strlen(block) + 1) {}
-  // Moves to the next attribute and sets its name, value and value slot (the
-  // quote or kMovedValue); false at the end.
-  bool Next(const char*& name, const char*& value, const char*& slot) {
-    while (IsBlockSeparator(*p_)) ++p_;
-    if (*p_ == '>' || *p_ == '/') return false;
-    name = p_;
-    p_ = ReadBlockValue(p_ + std::strlen(p_), slot, value);
-    return true;
-  }
+  // Moves to the next attribute and sets its name and value; false at the end.
   bool Next(const char*& name, const char*& value) {
-    const char* slot;
-    return Next(name, value, slot);
+    if (*p_ == kBlockEnd) return false;
+    name = p_;
+    value = p_ + std::strlen(p_) + 1;
+    p_ = value + std::strlen(value) + 1;
+    return true;
   }
   // The same, with the lengths of name and value, which the walk measures
-  // anyway (but for a moved value).
-  bool Next(std::string_view& name, std::string_view& value, const char*& slot) {
-    while (IsBlockSeparator(*p_)) ++p_;
-    if (*p_ == '>' || *p_ == '/') return false;
+  // anyway.
+  bool Next(std::string_view& name, std::string_view& value) {
+    if (*p_ == kBlockEnd) return false;
     name = std::string_view(p_);
-    const char* text;
-    p_ = ReadBlockValue(p_ + name.size(), slot, text);
-    value = *slot == kMovedValue ? std::string_view(text) : std::string_view(text, p_ - text);
+    value = std::string_view(p_ + name.size() + 1);
+    p_ = value.data() + value.size() + 1;
     return true;
   }
+  // Where the walk stands: after the last attribute, the block's end.
+  const char* position() const { return p_; }
 
  private:
   const char* p_;
@@ -124,20 +93,18 @@ class BlockAttributes {
 // so that a mismatch costs one character.
 inline const char* FindBlockValue(const char* block, const char* name) {
   const char* p = block + std::strlen(block) + 1;
-  for (;;) {
-    while (IsBlockSeparator(*p)) ++p;
-    if (*p == '>' || *p == '/') return nullptr;
+  while (*p != kBlockEnd) {
     const char* n = name;
     while (*p == *n && *n != '\0') {
       ++p;
       ++n;
     }
-    bool found = *n == '\0' && *p == '\0';
-    const char* slot;
-    const char* value;
-    p = ReadBlockValue(p, slot, value);
-    if (found) return value;
+    const bool found = *n == '\0' && *p == '\0';
+    p += std::strlen(p) + 1;  // past the rest of the name
+    if (found) return p;
+    p += std::strlen(p) + 1;  // past the value
   }
+  return nullptr;
 }
 
 }  // namespace zor2::xml

@@ -1,15 +1,18 @@
 #include "platform/xml/reader.h"
 
 #include <strings.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <array>
+#include <cerrno>
 #include <cstdint>
 #include <cstring>
 #include <string>
 #include <unordered_set>
 #include <vector>
 
+#include "platform/tools/file_descriptor.h"
 #include "platform/tools/file_input.h"
 #include "platform/xml/text_encoding.h"
 #include "platform/xml/xml_characters.h"
@@ -99,38 +102,66 @@ constexpr size_t kPairwiseLimit = 16;
 
 }  // namespace
 
-// One pass over a document's text. The parser writes into the text only
-// inside start tags (see document_storage.h), and never moves a byte other than
-// the tag's, so a position keeps its line and column; the only line ends it
-// overwrites (after an attribute name) are remembered in hidden_line_ends_ and
-// put back before a fault is located.
+// One pass over a document's text, in one window or in several read one after
+// the other. Within a window the parser writes into the text only inside
+// start tags, and never moves a byte other than the tag's, so a position
+// keeps its line and column; the only line ends it overwrites (after an
+// attribute name) are remembered in hidden_line_ends_ and put back before a
+// fault is located. Once a window is parsed, the blocks of its elements are
+// written compactly (document_storage.h), their values prepared, over the text
+// already parsed.
 class Parser {
  public:
-  // Parses `text` into a new document.
-  static bool Read(TextBuffer text, std::unique_ptr<Document>* document, ReadError* err) {
+  // Parses the whole of `text` into a new document.
+  static bool Read(TextBuffer text, const ReadPreparation& preparation,
+                   std::unique_ptr<Document>* document, ReadError* err) {
     size_t start = 0;
     if (!ConvertToUtf8(&text, &start, err)) return false;
     auto parsed = std::make_unique<Document>(Document::ReaderKey(), std::move(text));
-    if (!Parser(*parsed, start).Run(err)) return false;
+    Parser parser(*parsed, preparation);
+    char* const data = parsed->text_.data();
+    if (!parser.ParseWindow(data + start, data + parsed->text_.size, false)) {
+      parser.Locate(data + start, err);
+      return false;
+    }
+    parser.Finish();
     *document = std::move(parsed);
     return true;
   }
 
- private:
-  Parser(Document& document, size_t start)
-      : document_(document),
-        begin_(document.text_.data() + start),
-        end_(document.text_.data() + document.text_.size) {}
+  // Reads the regular file `file`, of `size` bytes, window after window into
+  // a buffer of that size, so that the blocks the document keeps grow from the
+  // front while the text still to parse follows them. False when the file
+  // must be read whole instead: its encoding is not UTF-8, it is not
+  // well-formed (the whole text is needed to say where), it changed size, or
+  // it could not be read (`err` then says why).
+  static bool ReadWindows(int file, size_t size, const ReadPreparation& preparation,
+                          std::unique_ptr<Document>* document, ReadError* err);
 
-  bool Run(ReadError* err) {
-    if (ParseDocument()) return true;
-    err->reason = std::move(reason_);
-    for (const HiddenLineEnd& hidden : hidden_line_ends_) begin_[hidden.offset] = hidden.byte;
-    LocateInText(begin_, fault_, &err->line, &err->column);
-    return false;
+ private:
+  Parser(Document& document, const ReadPreparation& preparation)
+      : document_(document), preparation_(preparation), out_(document.text_.data()) {
+    if (preparation.originals != nullptr) preparation.originals->Clear();
   }
 
-  bool ParseDocument();
+  // Parses [begin, end) (*end is zero); `more` tells whether text follows the
+  // window, which must then end just before a "<", so that parsing stops
+  // there between two pieces of markup. False with the fault set.
+  bool ParseWindow(char* begin, char* end, bool more);
+  // Sets `err` from the fault, in the text that starts at `begin`.
+  void Locate(char* begin, ReadError* err) {
+    err->reason = std::move(reason_);
+    for (const HiddenLineEnd& hidden : hidden_line_ends_) begin[hidden.offset] = hidden.byte;
+    LocateInText(begin, fault_, &err->line, &err->column);
+  }
+  // Writes the blocks of the window's elements compactly, with their values
+  // prepared, from out_ on and ending by `limit`, where text still to parse
+  // begins (or in the block arena when one would reach it).
+  void CompactBlocks(const char* limit);
+  void Finish() {
+    if (preparation_.originals != nullptr) preparation_.originals->Seal();
+  }
+
   bool ParseMarkup(char* lt);
   bool ParseStartTag(char* lt);
   bool ParseAttribute();
@@ -159,13 +190,17 @@ class Parser {
   }
 
   Document& document_;
-  char* const begin_;
-  char* const end_;  // *end_ is the zero sentinel
+  const ReadPreparation& preparation_;
+  char* begin_ = nullptr;
+  char* end_ = nullptr;  // *end_ is the zero sentinel
+  bool first_window_ = true;
   char* p_ = nullptr;
-  // An element whose end tag is to come.
+  // An element whose end tag is to come, by its index (elements move as the
+  // store grows).
+  static constexpr size_t kNone = static_cast<size_t>(-1);
   struct Open {
-    Element* element;
-    Element* last_child;
+    size_t element;
+    size_t last_child;  // kNone before the first child
   };
   std::vector<Open> open_;
   bool root_seen_ = false;
@@ -181,14 +216,28 @@ class Parser {
   std::vector<HiddenLineEnd> hidden_line_ends_;
   const char* fault_ = nullptr;
   std::string reason_;
+  // The elements of the window, whose blocks are still where they were read.
+  std::vector<size_t> fresh_;
+  char* out_;  // where the next compact block goes
+  std::string block_;
+  std::string rewritten_;
+  struct Kept {
+    size_t offset;         // of the value in block_
+    std::string original;  // copied: its text may be overwritten by the block
+  };
+  std::vector<Kept> kept_;
 };
 
-bool Parser::ParseDocument() {
+bool Parser::ParseWindow(char* begin, char* end, bool more) {
+  begin_ = begin;
+  end_ = end;
+  hidden_line_ends_.clear();
   p_ = begin_;
   for (;;) {
     char* p = SkipSpace(p_);
     char* lt = p;
     if (*p != '<') {
+      if (p == end_ && more) break;
       if (open_.empty()) {
         if (p == end_) break;
         return Fail(p,
@@ -200,12 +249,63 @@ bool Parser::ParseDocument() {
     }
     if (!ParseMarkup(lt)) return false;
   }
-  if (!open_.empty()) {
-    return Fail(end_, "unexpected end of document, element <" +
-                          std::string(open_.back().element->tag()) + "> is not closed");
+  first_window_ = false;
+  if (!more) {
+    if (!open_.empty()) {
+      return Fail(end_, "unexpected end of document, element <" +
+                            std::string(document_.elements_[open_.back().element].tag()) +
+                            "> is not closed");
+    }
+    if (!root_seen_) return Fail(end_, begin_ == end_ ? "empty document" : "no root element");
   }
-  if (!root_seen_) return Fail(end_, begin_ == end_ ? "empty document" : "no root element");
+  CompactBlocks(end_);
   return true;
+}
+
+void Parser::CompactBlocks(const char* limit) {
+  const ReadPreparation& prep = preparation_;
+  for (size_t i = 0; i < fresh_.size(); ++i) {
+    Element& element = document_.elements_[fresh_[i]];
+    // The block as the window left it: the tag, then each attribute as
+    //   separators name \0 [blanks] [=] [blanks] quote value \0
+    // and ">" or "/".
+    const char* p = element.block();
+    const size_t tag_size = std::strlen(p) + 1;
+    block_.assign(p, tag_size);
+    kept_.clear();
+    for (p += tag_size;;) {
+      while (*p == '\0' || Is(*p, kSpace)) ++p;
+      if (*p == '>' || *p == '/') break;
+      const std::string_view name(p);
+      block_.append(name.data(), name.size() + 1);
+      p += name.size();
+      while (*p != '"' && *p != '\'') ++p;
+      const std::string_view value(p + 1);
+      p = value.data() + value.size() + 1;
+      std::string_view text = value;
+      if (prep.rewrite != nullptr) {
+        rewritten_.clear();
+        if (prep.rewrite(value, &rewritten_)) {
+          text = std::string_view(rewritten_.c_str());  // up to its first zero byte
+          if (prep.originals != nullptr && prep.originals->WorthKeeping(value)) {
+            kept_.push_back({block_.size(), std::string(value)});
+          }
+        }
+      }
+      block_.append(text.data(), text.size());
+      block_.push_back('\0');
+    }
+    block_.push_back(kBlockEnd);
+    // Up to where the next block of the window begins, or the text after it.
+    const char* block_limit =
+        i + 1 < fresh_.size() ? document_.elements_[fresh_[i + 1]].block() : limit;
+    char* const place = document_.PlaceBlock(block_, out_, block_limit);
+    element.set_block(place);
+    for (const Kept& k : kept_) {
+      prep.originals->Add(place + k.offset, k.original, place + block_.size() == out_);
+    }
+  }
+  fresh_.clear();
 }
 
 bool Parser::ParseMarkup(char* lt) {
@@ -232,16 +332,17 @@ bool Parser::ParseStartTag(char* lt) {
   size_t length = name_end - name;
   std::memmove(lt, name, length);
   lt[length] = '\0';
-  Element* element = document_.NewElement(lt);
+  const size_t element = document_.elements_.Add(lt);
+  fresh_.push_back(element);
   if (!root_seen_) {
     root_seen_ = true;
-    document_.root_ = element;
   } else {
     Open& parent = open_.back();
-    if (parent.last_child != nullptr) {
-      parent.last_child->next_ = element;
+    ElementStore& elements = document_.elements_;
+    if (parent.last_child != kNone) {
+      elements[parent.last_child].links_ |= static_cast<uint32_t>(element - parent.last_child) << 1;
     } else {
-      parent.element->first_child_ = element;
+      elements[parent.element].links_ |= 1;  // its first child follows it
     }
     parent.last_child = element;
   }
@@ -257,7 +358,7 @@ bool Parser::ParseStartTag(char* lt) {
     p_ = SkipSpace(p_);
     if (*p_ == '>') {
       ++p_;
-      open_.push_back({element, nullptr});
+      open_.push_back({element, kNone});
       return true;
     }
     if (*p_ == '/') {
@@ -393,7 +494,7 @@ bool Parser::ParseEndTag(char* lt) {
     return Fail(lt,
                 root_closed_ ? "end tag after the root element" : "end tag without a start tag");
   }
-  const char* tag = open_.back().element->tag();
+  const char* tag = document_.elements_[open_.back().element].tag();
   const char* expected = tag;
   char* p = name;
   while (*expected != '\0' && *expected == *p) {
@@ -486,7 +587,8 @@ bool Parser::ParseProcessingInstruction(char* lt) {
   char* target = lt + 2;
   if (!Is(*target, kNameStart)) return Expected(target, "a processing instruction target");
   char* target_end = SkipName(target + 1);
-  if (target_end - target == 3 && strncasecmp(target, "xml", 3) == 0 && lt != begin_) {
+  if (target_end - target == 3 && strncasecmp(target, "xml", 3) == 0 &&
+      (lt != begin_ || !first_window_)) {
     return Fail(lt, "XML declaration not at the start of the document");
   }
   char* close = Find(target_end, end_, "?>");
@@ -497,20 +599,39 @@ bool Parser::ParseProcessingInstruction(char* lt) {
 
 namespace {
 
-// Reads the regular file at `path` in one piece into `text`, with spare
-// capacity after it for values that preparation makes longer.
-bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
+bool Refuse(ReadError* err, int error_number) {
+  err->reason = std::strerror(error_number);
+  return false;
+}
+
+// A window of text read at once: large enough that reading costs few calls,
+// small enough to add little to what a document holds.
+constexpr size_t kWindowBytes = size_t{1} << 20;
+
+// Opens the regular file at `path` and sets `size`, by the rules of every
+// input file (OpenRegularFile).
+bool OpenDocument(const std::string& path, uintmax_t memory_limit, FileDescriptor* file,
+                  size_t* size, ReadError* err) {
+  FileReadError error;
+  if (OpenRegularFile(path, memory_limit, file, size, &error)) return true;
+  // A document that could never be held is refused before any of it is read.
+  err->reason = error.too_large ? kNotEnoughMemory : std::move(error.reason);
+  return false;
+}
+
+// Reads `file`, of `size` bytes when it was opened, in one piece into `text`.
+bool ReadWhole(int file, size_t size, TextBuffer* text, ReadError* err) {
   TextBuffer buffer;
-  const ReadRoom room = [&buffer](size_t size, size_t kept) {
-    TextBuffer larger = TextBuffer::Allocate(size, size / 4);
+  const ReadRoom room = [&buffer](size_t room_size, size_t kept) {
+    TextBuffer larger = TextBuffer::Allocate(room_size);
     if (kept > 0) std::memcpy(larger.data(), buffer.data(), kept);
     buffer = std::move(larger);
     return buffer.data();
   };
   size_t length = 0;
   FileReadError error;
-  if (!ReadRegularFile(path, room, &length, &error)) {
-    err->reason = error.too_large ? kNotEnoughMemory : std::move(error.reason);
+  if (!ReadOpenFile(file, size, room, &length, &error)) {
+    err->reason = std::move(error.reason);
     return false;
   }
   buffer.size = length;
@@ -519,21 +640,109 @@ bool ReadWholeFile(const std::string& path, TextBuffer* text, ReadError* err) {
   return true;
 }
 
+// Reads from `file` into [*end, limit), up to `wanted` bytes; sets `eof` when
+// the file ended. False with errno set when it cannot be read.
+bool ReadSome(int file, char*& end, const char* limit, size_t wanted, bool& eof) {
+  for (;;) {
+    const ssize_t got = ::read(file, end, std::min<size_t>(wanted, limit - end));
+    if (got < 0 && errno == EINTR) continue;
+    if (got < 0) return false;
+    eof = got == 0;
+    end += got;
+    return true;
+  }
+}
+
 }  // namespace
+
+bool Parser::ReadWindows(int file, size_t size, const ReadPreparation& preparation,
+                         std::unique_ptr<Document>* document, ReadError* err) {
+  auto parsed = std::make_unique<Document>(Document::ReaderKey(), TextBuffer::Allocate(size));
+  char* const data = parsed->text_.data();
+  char* const capacity_end = data + size;
+  Parser parser(*parsed, preparation);
+  char* window = data;  // the text still to parse
+  char* read_end = data;
+  bool eof = false;
+  size_t wanted = kWindowBytes;
+  for (bool first = true;;) {
+    while (!eof && static_cast<size_t>(read_end - window) < wanted) {
+      if (read_end == capacity_end) {
+        // All the bytes the file had when opened are read: it must end here.
+        char probe;
+        char* probe_end = &probe;
+        if (!ReadSome(file, probe_end, &probe + 1, 1, eof)) return Refuse(err, errno);
+        if (!eof) return false;  // it grew: read whole
+        break;
+      }
+      if (!ReadSome(file, read_end, capacity_end, kWindowBytes, eof)) return Refuse(err, errno);
+    }
+    if (first) {
+      const std::string_view head(data, read_end - data);
+      if (!IsPlainUtf8(head, eof)) return false;
+      if (head.starts_with("\xEF\xBB\xBF")) window += 3;
+      first = false;
+    }
+    // A window ends just before its last "<", between two pieces of markup
+    // (or, should the "<" stand in a comment, with a fault that has the file
+    // read whole).
+    char* cut = read_end;
+    if (!eof) {
+      cut = read_end - window > 1
+                ? static_cast<char*>(::memrchr(window + 1, '<', read_end - window - 1))
+                : nullptr;
+      if (cut == nullptr) {
+        wanted *= 2;
+        continue;
+      }
+    }
+    const char saved = *cut;
+    *cut = '\0';
+    const bool parsed_window = parser.ParseWindow(window, cut, !eof);
+    *cut = saved;
+    if (!parsed_window) return false;
+    if (eof) break;
+    // The rest follows the blocks, and the next window reads after it.
+    const size_t rest = read_end - cut;
+    std::memmove(parser.out_, cut, rest);
+    window = parser.out_;
+    read_end = window + rest;
+    wanted = kWindowBytes;
+  }
+  parser.Finish();
+  *document = std::move(parsed);
+  return true;
+}
 
 bool ReadDocumentFile(const std::string& path, std::unique_ptr<Document>* document,
                       ReadError* err) {
+  return ReadDocumentFile(path, MemoryLimit(), ReadPreparation(), document, err);
+}
+
+bool ReadDocumentFile(const std::string& path, uintmax_t memory_limit,
+                      const ReadPreparation& preparation, std::unique_ptr<Document>* document,
+                      ReadError* err) {
   *err = ReadError{};
+  FileDescriptor file(-1);
+  size_t size = 0;
+  if (!OpenDocument(path, memory_limit, &file, &size, err)) return false;
+  // A small document costs little more than its size read whole.
+  if (size > 2 * kWindowBytes) {
+    if (Parser::ReadWindows(file.get(), size, preparation, document, err)) return true;
+    if (!err->reason.empty()) return false;
+    // Read again from the start, whole.
+    if (::lseek(file.get(), 0, SEEK_SET) != 0) return Refuse(err, errno);
+  }
   TextBuffer text;
-  if (!ReadWholeFile(path, &text, err)) return false;
-  return Parser::Read(std::move(text), document, err);
+  if (!ReadWhole(file.get(), size, &text, err)) return false;
+  return Parser::Read(std::move(text), preparation, document, err);
 }
 
 bool ReadDocumentText(std::string_view text, std::unique_ptr<Document>* document, ReadError* err) {
   *err = ReadError{};
-  TextBuffer copy = TextBuffer::Allocate(text.size(), text.size() / 4);
+  TextBuffer copy = TextBuffer::Allocate(text.size());
   if (!text.empty()) std::memcpy(copy.data(), text.data(), text.size());
-  return Parser::Read(std::move(copy), document, err);
+  return Parser::Read(std::move(copy), ReadPreparation(), document, err);
 }
 
 }  // namespace zor2::xml

@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "platform/tools/xml_escaping.h"
 #include "tests/test_util.h"
 
 namespace zor2::xml {
@@ -180,6 +181,61 @@ TEST(ReaderTest, SmallElementsAfterALargeOne) {
   ReadError error;
   EXPECT_TRUE(Fails(text + "/><b x='1' x='2'/></r>", &error));
   EXPECT_EQ(error.reason, "duplicate attribute \"x\"");
+}
+
+// The whole tree of `element`, with the values of the attributes it may have.
+std::string Dump(const Element& element) {
+  std::string text = std::string("<") + element.tag();
+  for (const char* name : {"Name", "v", "Type", "a"}) {
+    if (const char* value = element.FindAttribute(name)) text.append(" ").append(value);
+  }
+  text += ">";
+  for (const Element* child = element.first_child(); child; child = child->next_sibling()) {
+    text += Dump(*child);
+  }
+  return text + "</>";
+}
+
+using WindowedReaderTest = testing::TempDirTest;
+
+// A document of several megabytes is read window by window; it must read as
+// the same text read whole: elements, values, their preparation and the
+// originals kept, and where a fault is, with "<" in comments across windows
+// and line ends of every kind.
+TEST_F(WindowedReaderTest, ReadsLargeDocumentsAsTheSameTextReadWhole) {
+  std::string text = "\xEF\xBB\xBF<?xml version=\"1.0\" encoding=\"UTF-8\"?>\r\n<W>";
+  for (int i = 0; text.size() < (size_t{5} << 20); ++i) {
+    const std::string n = std::to_string(i);
+    text += "<F Name=\"F" + n + "\"\r\n  v='a &amp; b &lt; " + n + "'><!-- <not> <a> <tag> -->";
+    text += "\r<M Name=\"m\" Type=\"x &#65;\"/><M\n Name='m" + n + "'/>text</F>\n";
+  }
+  const std::string good = text + "</W>";
+  const std::string bad = text + "<Last a=\"1\" a=\"2\"/></W>";
+  for (const std::string* document : {&good, &bad}) {
+    std::unique_ptr<Document> whole;
+    ReadError whole_err;
+    const bool whole_read = ReadDocumentText(*document, &whole, &whole_err);
+    OriginalValues whole_originals;
+    if (whole_read) whole->RewriteValues(DecodeXmlReferences, &whole_originals);
+
+    std::unique_ptr<Document> windowed;
+    ReadError windowed_err;
+    OriginalValues windowed_originals;
+    const bool windowed_read =
+        ReadDocumentFile(Write("doc.xml", *document), MemoryLimit(),
+                         {DecodeXmlReferences, &windowed_originals}, &windowed, &windowed_err);
+    ASSERT_EQ(windowed_read, whole_read);
+    EXPECT_EQ(windowed_read, document == &good);
+    EXPECT_EQ(windowed_err.reason, whole_err.reason);
+    EXPECT_EQ(windowed_err.line, whole_err.line);
+    EXPECT_EQ(windowed_err.column, whole_err.column);
+    if (!whole_read) continue;
+    EXPECT_EQ(Dump(windowed->root()), Dump(whole->root()));
+    const Element* last = windowed->root().first_child();
+    while (last->next_sibling() != nullptr) last = last->next_sibling();
+    const std::string written = std::string("a &amp; b &lt; ") + (last->FindAttribute("Name") + 1);
+    EXPECT_EQ(windowed_originals.Find(last->FindAttribute("v")), written);
+  }
 }
 
 }  // namespace

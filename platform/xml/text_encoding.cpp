@@ -232,6 +232,21 @@ bool ConvertToUtf8(TextBuffer* text, size_t* start, ReadError* err) {
   return Transcode(name, 1, text, 0, declared->offset, err);
 }
 
+bool IsPlainUtf8(std::string_view head, bool whole) {
+  if (HasPrefix(head, "\xEF\xBB\xBF")) return true;
+  if (!whole && head.size() < 4) return false;
+  for (std::string_view mark : {std::string_view("\xFF\xFE"), std::string_view("\xFE\xFF"),
+                                std::string_view("\0\0\xFE\xFF", 4)}) {
+    if (HasPrefix(head, mark)) return false;
+  }
+  // The declaration must be whole to be read.
+  if (HasPrefix(head, "<?xml") && !whole && head.find("?>") == std::string_view::npos) {
+    return false;
+  }
+  const std::optional<Declaration> declared = DeclaredEncoding(head);
+  return !declared || IsUTF8Name(declared->encoding);
+}
+
 void LocateInText(const char* begin, const char* position, int* line, int* column) {
   size_t lines = 0;
   const char* line_start = begin;

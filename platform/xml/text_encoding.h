@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <string_view>
 
 #include "platform/xml/document_storage.h"
 #include "platform/xml/read_error.h"
@@ -18,6 +19,12 @@ namespace zor2::xml {
 // encoding, the system cannot set up the conversion (no position then), or the
 // bytes are not valid in it.
 bool ConvertToUtf8(TextBuffer* text, size_t* start, ReadError* err);
+
+// Whether ConvertToUtf8 would leave the document that begins with `head` as
+// it is, but for skipping a UTF-8 byte-order mark: false when it would
+// convert or refuse it, or when `head` (the whole document when `whole`) does
+// not tell.
+bool IsPlainUtf8(std::string_view head, bool whole);
 
 // Sets the 1-based line and column, counted in characters, of `position` in
 // the UTF-8 text that starts at `begin`. A lone carriage return, a carriage

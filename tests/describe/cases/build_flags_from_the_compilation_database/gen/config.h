@@ -1,0 +1,2 @@
+#pragma once
+typedef unsigned long lib_size_t;

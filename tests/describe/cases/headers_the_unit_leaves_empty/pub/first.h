@@ -1,0 +1,6 @@
+#ifndef SHARED_GUARD
+#define SHARED_GUARD
+struct First {
+  void One();
+};
+#endif

@@ -1,0 +1,3 @@
+// Includes only: declares nothing of its own.
+#pragma once
+#include "first.h"

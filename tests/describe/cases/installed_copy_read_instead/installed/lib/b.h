@@ -1,0 +1,6 @@
+#pragma once
+namespace lib {
+struct B {
+  long Value() const;
+};
+}  // namespace lib

@@ -1,0 +1,7 @@
+#pragma once
+#include <lib/b.h>
+namespace lib {
+struct A {
+  B Make();
+};
+}  // namespace lib

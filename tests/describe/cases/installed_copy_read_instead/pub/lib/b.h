@@ -1,0 +1,6 @@
+#pragma once
+namespace lib {
+struct B {
+  int Value() const;
+};
+}  // namespace lib

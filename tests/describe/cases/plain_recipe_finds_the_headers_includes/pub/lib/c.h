@@ -1,0 +1,6 @@
+#pragma once
+namespace lib {
+struct C {
+  int value;
+};
+}  // namespace lib
