@@ -253,8 +253,9 @@ class ComparisonRun {
       summary_.baseline = config_.baseline_path.has_value();
       if (baseline_) {
         baseline_->Accept(&findings_);
-        for (Absence& document : summary_.missing_documents)
+        for (Absence& document : summary_.missing_documents) {
           baseline_->Accept("Document", &document);
+        }
         for (Absence& framework : summary_.missing_frameworks) {
           baseline_->Accept("Framework", &framework);
         }
@@ -286,8 +287,8 @@ class ComparisonRun {
     }
   }
 
-  // The report and the help page, and meanwhile the exports, each by a task;
-  // they only read the findings, which no longer change.
+  // Writes the report and the help page here while tasks make and write the
+  // exports, which only read the findings: these no longer change.
   void WriteOutputs() {
     run_ = RunDescription{std::string("zor2check ") + kVersion,
                           config_.reference_path,
