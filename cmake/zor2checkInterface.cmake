@@ -15,7 +15,8 @@
 #   with -fail, accepting the findings of BASELINE when given and, with LEVEL, checking the L1
 #   files with -L -level LEVEL. It leaves report.xml and the exports findings.md,
 #   findings.html and findings.sarif in <build>/zor2check/<name>/, and when the check fails it
-#   prints the findings and how to accept the change.
+#   prints the findings and how to accept the change. The SARIF file names the headers by
+#   their path from the top source directory (-sarif-base PUBLIC_HEADERS).
 # - Target <name>_update_interface: rewrites REFERENCE from the headers, for a change that is
 #   meant (commit the file, so that the change shows in review).
 #
@@ -190,6 +191,12 @@ function(zor2check_interface)
   foreach(extension md html sarif)
     list(APPEND check -export "${findings}.${extension}")
   endforeach()
+  # The public headers' folder in the source tree, so that code-scanning annotations land on
+  # the right file; a later -sarif-base in OPTIONS wins.
+  file(RELATIVE_PATH sarif_base "${CMAKE_SOURCE_DIR}" "${arg_PUBLIC_HEADERS}")
+  if(NOT sarif_base MATCHES "^\\.\\.(/|$)" AND NOT IS_ABSOLUTE "${sarif_base}")
+    list(APPEND check -sarif-base "${sarif_base}")
+  endif()
   list(APPEND check ${arg_OPTIONS})
   set(content "")
   foreach(item IN LISTS check)

@@ -21,7 +21,7 @@ bool ValueOf(const xml::Element& element, const char* name, std::string* value) 
 
 bool IsLocationTag(std::string_view tag) {
   return tag == "Framework" || tag == "Interfaces" || tag == "File" || tag == "Class" ||
-         tag == "Method" || tag == "Arg";
+         tag == "Method" || tag == "Arg" || tag == "Document";
 }
 
 }  // namespace
@@ -83,6 +83,14 @@ void Baseline::Accept(std::vector<Finding>* findings) {
     finding.report_error->SetAttribute("Accepted", "Y");
     if (entry->second.has_reason) finding.report_error->SetAttribute("Reason", finding.reason);
   }
+}
+
+void Baseline::Accept(std::string_view tag, Absence* absence) {
+  auto entry = entries_.find(ReportStep(tag, absence->name.c_str(), nullptr) + kNoCounterpart);
+  if (entry == entries_.end()) return;
+  entry->second.matched = true;
+  absence->accepted = true;
+  absence->reason = entry->second.reason;
 }
 
 std::vector<std::string> Baseline::StaleEntries() const {

@@ -22,7 +22,8 @@ constexpr std::string_view kStyle = R"(<style>
 :root { color-scheme: light; --line: #d0d4da; --muted: #5b6470; --bad: #b42318; --good: #1a7f37; }
 * { box-sizing: border-box; }
 body { margin: 0 auto; max-width: 72rem; padding: 1rem 1.5rem 3rem; color: #1f2328;
-  font: 15px/1.45 system-ui, -apple-system, "Segoe UI", "DejaVu Sans", sans-serif; }
+  font: 15px/1.45 system-ui, -apple-system, "Segoe UI", "DejaVu Sans", sans-serif;
+  overflow-wrap: anywhere; }
 h1 { font-size: 1.5rem; margin: 0.5rem 0; }
 h2 { font-size: 1.3rem; margin: 2rem 0 0.5rem; border-bottom: 2px solid var(--line); }
 h3 { font-size: 1.1rem; margin: 1.25rem 0 0.5rem; }
@@ -30,7 +31,7 @@ h4 { font-size: 1rem; margin: 1rem 0 0.4rem; }
 code, .value { font-family: "DejaVu Sans Mono", Menlo, Consolas, monospace; font-size: 0.9em; }
 .verdict { font-size: 1.2rem; font-weight: 700; padding: 0.6rem 0.9rem; border-radius: 6px;
   border: 2px solid; margin: 0.5rem 0; }
-.verdict.failed { color: var(--bad); background: #fef3f2; }
+.verdict.failed, .verdict.error { color: var(--bad); background: #fef3f2; }
 .verdict.passed { color: var(--good); background: #ecfdf3; }
 .notes li { font-weight: 600; color: var(--bad); }
 .muted, .group { color: var(--muted); font-weight: normal; }
@@ -174,7 +175,8 @@ const std::array<std::string, kMessageTypes.size()>& EscapedHelpTexts() {
   return texts;
 }
 
-void WriteValueCell(Page& page, const std::string& value) {
+// A value, and how many more there are that it leaves out.
+void WriteValueCell(Page& page, const std::string& value, int more = 0) {
   page << "<td>";
   if (value.empty()) {
     page << "<em class=\"muted\">none</em>";
@@ -182,6 +184,10 @@ void WriteValueCell(Page& page, const std::string& value) {
     page << "<code class=\"value\">";
     page.Text(value);
     page << "</code>";
+  }
+  if (more > 0) {
+    page << "<br><em class=\"muted\">and ";
+    page.Number(more) << " more</em>";
   }
   page << "</td>";
 }
@@ -196,9 +202,10 @@ void WriteFinding(Page& page, const Finding& finding, size_t index) {
   page.Text(type.id) << "</span> <span class=\"fullname\">";
   page.Text(type.full_name) << "</span> <span class=\"state " << state << "\">" << state
                             << "</span></div>\n";
-  if (!finding.method.empty() || !finding.signature.empty() || !finding.argument.empty()) {
+  const bool in_method = !finding.method.empty() || !finding.signature.empty();
+  if (in_method || !finding.argument.empty() || finding.line > 0) {
     page << "<div class=\"where\">";
-    if (!finding.method.empty() || !finding.signature.empty()) {
+    if (in_method) {
       page << "Method <code>";
       page.Text(finding.signature.empty() ? finding.method : finding.signature) << "</code>";
     }
@@ -206,12 +213,18 @@ void WriteFinding(Page& page, const Finding& finding, size_t index) {
       page << " argument <code>";
       page.Text(finding.argument) << "</code>";
     }
+    if (finding.line > 0) {
+      page << (in_method || !finding.argument.empty() ? " at <code class=\"line\">"
+                                                      : "At <code class=\"line\">");
+      page.Text(finding.file) << ":";
+      page.Number(finding.line) << "</code>";
+    }
     page << "</div>\n";
   }
   if (!finding.reference_value.empty() || !finding.checked_value.empty()) {
     page << "<table class=\"values\"><tr><th>Reference</th><th>Checked</th></tr><tr>";
     WriteValueCell(page, finding.reference_value);
-    WriteValueCell(page, finding.checked_value);
+    WriteValueCell(page, finding.checked_value, finding.more_replacements);
     page << "</tr></table>\n";
   }
   if (finding.accepted) {
@@ -324,7 +337,7 @@ std::string ExportHtml(const RunDescription& run, const RunSummary& summary,
   const std::string verdict = VerdictLine(summary);
   page << kHead << "<title>zor2check: ";
   page.Text(verdict) << "</title>\n" << kStyle << "<body>\n<header>\n<h1>zor2check report</h1>\n";
-  page << "<p id=\"verdict\" class=\"verdict " << (summary.failed ? "failed" : "passed") << "\">";
+  page << "<p id=\"verdict\" class=\"verdict " << VerdictName(VerdictOf(summary)) << "\">";
   page.Text(verdict) << "</p>\n<p class=\"scope\">";
   page.Text(ScopeLine(summary)) << "</p>\n";
   const std::vector<std::string> notes = SummaryNotes(summary);

@@ -1,5 +1,7 @@
 #include "documents/export_json.h"
 
+#include <utility>
+
 #include "documents/export_text.h"
 #include "documents/json_writer.h"
 
@@ -9,7 +11,7 @@ namespace {
 
 void WriteSummary(const RunSummary& summary, JsonWriter& json) {
   json.BeginObject();
-  json.Member("verdict", summary.failed ? "failed" : "passed");
+  json.Member("verdict", VerdictName(VerdictOf(summary)));
   const int total = TotalFindings(summary);
   json.Member("findings", total);
   json.Member("new", total - summary.accepted);
@@ -24,8 +26,23 @@ void WriteSummary(const RunSummary& summary, JsonWriter& json) {
   json.Member("frameworks", summary.frameworks);
   json.Member("pairs_compared", summary.pairs_compared);
   json.Member("pairs_skipped", summary.pairs_skipped);
-  json.Member("missing_counterparts", summary.missing_counterparts);
+  json.Member("files_checked", summary.files_checked);
+  json.Member("nothing_checked", summary.nothing_checked);
+  std::vector<std::string> missing;
+  for (const Absence& absence : summary.missing_documents) missing.push_back(absence.name);
+  json.Member("missing_counterparts", missing);
+  json.Key("without_counterpart");
+  WriteAbsences(summary, json);
   json.Member("stale_baseline_entries", summary.stale_baseline_entries);
+  json.Key("failures");
+  json.BeginArray();
+  for (const RunFailure& failure : summary.failures) {
+    json.BeginObject();
+    json.Member("path", failure.path);
+    json.Member("reason", failure.reason);
+    json.EndObject();
+  }
+  json.EndArray();
   json.EndObject();
 }
 
@@ -41,14 +58,32 @@ void WriteFinding(const Finding& finding, JsonWriter& json) {
   json.Member("method", finding.method);
   json.Member("signature", finding.signature);
   json.Member("argument", finding.argument);
+  json.Member("line", finding.line);
   json.Member("reference_value", finding.reference_value);
   json.Member("checked_value", finding.checked_value);
+  json.Member("more_replacements", finding.more_replacements);
   json.Member("accepted", finding.accepted);
   json.Member("reason", finding.reason);
   json.EndObject();
 }
 
 }  // namespace
+
+void WriteAbsences(const RunSummary& summary, JsonWriter& json) {
+  json.BeginArray();
+  for (const auto& [kind, absences] : {std::pair{"document", &summary.missing_documents},
+                                       std::pair{"framework", &summary.missing_frameworks}}) {
+    for (const Absence& absence : *absences) {
+      json.BeginObject();
+      json.Member("kind", kind);
+      json.Member("name", absence.name);
+      json.Member("accepted", absence.accepted);
+      json.Member("reason", absence.reason);
+      json.EndObject();
+    }
+  }
+  json.EndArray();
+}
 
 std::string ExportJson(const RunDescription& run, const RunSummary& summary,
                        const std::vector<Finding>& findings) {

@@ -12,7 +12,15 @@ TEST(MarkdownTextTest, EscapesMarkupAndKeepsLineBreaksInsideACell) {
   EXPECT_EQ(MarkdownText("a|b *c* _d_ [e](f) <g> `h` #1 @me $x$ ~i~ &amp; \\"),
             "a\\|b \\*c\\* \\_d\\_ \\[e\\](f) \\<g\\> \\`h\\` \\#1 \\@me \\$x\\$ \\~i\\~ "
             "\\&amp; \\\\");
-  EXPECT_EQ(MarkdownText("one\r\ntwo"), "one<br>two");
+  EXPECT_EQ(MarkdownText("one\r\ntwo\rthree"), "one<br>two<br>three");
+}
+
+// Hosting services turn URLs, "www." names and e-mail addresses into links,
+// the last whatever their escapes: each is broken up where it would start.
+TEST(MarkdownTextTest, BreaksUpWhatWouldBecomeALink) {
+  EXPECT_EQ(MarkdownText("https://a.example www.b.com WWW.c.com wwwx.d FAILED: 1"),
+            "https\\://a.example www\\.b.com WWW\\.c.com wwwx.d FAILED: 1");
+  EXPECT_EQ(MarkdownText("me@x.com @team"), "me<!-- -->\\@x.com \\@team");
 }
 
 TEST(MarkdownCodeTest, FencesLongerThanAnyBacktickRunAndEscapesPipes) {
@@ -24,6 +32,10 @@ TEST(MarkdownCodeTest, FencesLongerThanAnyBacktickRunAndEscapesPipes) {
   EXPECT_EQ(MarkdownCode("void Run(long a)\nvoid Run(short a)"),
             "`void Run(long a)`<br>`void Run(short a)`");
   EXPECT_EQ(MarkdownCode(""), "");
+  // A lone carriage return ends a line as a line feed does.
+  EXPECT_EQ(MarkdownCode("a\r[x](y)\r\nb"), "`a`<br>`[x](y)`<br>`b`");
+  // A span would show blanks as nothing.
+  EXPECT_EQ(MarkdownCode("  \t\r\n"), "*blank: 2 spaces, 1 tab, 1 line break*");
 }
 
 Finding At(std::string framework, std::string file, MessageCode code, std::string reference,
@@ -43,11 +55,11 @@ TEST(ExportMarkdownTest, GroupsFindingsByFrameworkAndFileWithValuesSideBySide) {
   RunSummary summary;
   const std::string markdown = ExportMarkdown({}, summary, findings);
 
-  const size_t geo = markdown.find("### Framework Geo\n");
-  const size_t point = markdown.find("#### Public: Point.h\n");
+  const size_t geo = markdown.find("#### Framework Geo\n");
+  const size_t point = markdown.find("##### Public: Point.h\n");
   const size_t mrthc = markdown.find("| `MRTHC` | `K` |  | `double` | `float` | new |\n");
   const size_t pmhc = markdown.find("| `PMHC` | `K` |  | `P` | `R` | new |\n");
-  const size_t doc = markdown.find("### Framework Doc\n");
+  const size_t doc = markdown.find("#### Framework Doc\n");
   const size_t advhc =
       markdown.find("| `ADVHC` | `K` |  | *none* | `1` | accepted: agreed \\| see \\#4 |\n");
   ASSERT_NE(geo, std::string::npos);
@@ -61,7 +73,7 @@ TEST(ExportMarkdownTest, GroupsFindingsByFrameworkAndFileWithValuesSideBySide) {
   EXPECT_LT(mrthc, pmhc);
   EXPECT_LT(pmhc, doc);
   EXPECT_LT(doc, advhc);
-  EXPECT_EQ(markdown.find("### Framework Geo", geo + 1), std::string::npos);
+  EXPECT_EQ(markdown.find("#### Framework Geo", geo + 1), std::string::npos);
 }
 
 }  // namespace

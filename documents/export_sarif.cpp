@@ -4,7 +4,10 @@
 #include <cstdint>
 #include <string_view>
 #include <unordered_map>
+#include <utility>
+#include <vector>
 
+#include "documents/export_json.h"
 #include "documents/export_text.h"
 #include "documents/json_writer.h"
 
@@ -32,20 +35,46 @@ std::string RuleName(std::string_view full_name) {
   return name;
 }
 
-// `path` as a relative URI reference: every byte but the unreserved ones and
-// "/" percent-encoded, so that a ":" or a blank cannot change its meaning.
-std::string RelativeUri(std::string_view path) {
+// The base that every artifact's URI is relative to: the root of the
+// repository, which only the service that reads the log knows.
+constexpr std::string_view kSourceRoot = "SRCROOT";
+
+// `folder` and then `file` as one relative URI reference: "/" between the
+// segments, no empty, "." or ".." segment (a ".." takes the segment before it
+// away, and none before the start), every byte of a segment but the
+// unreserved ones percent-encoded, so that a ":" or a blank cannot change its
+// meaning.
+std::string RelativeUri(std::string_view folder, std::string_view file) {
   static constexpr char kHex[] = "0123456789ABCDEF";
-  std::string uri;
-  for (char c : path) {
-    const auto byte = static_cast<unsigned char>(c);
-    if (std::isalnum(byte) || c == '-' || c == '.' || c == '_' || c == '~' || c == '/') {
-      uri.push_back(c);
-    } else {
-      uri.push_back('%');
-      uri.push_back(kHex[byte >> 4]);
-      uri.push_back(kHex[byte & 0xF]);
+  std::vector<std::string> segments;
+  for (std::string_view path : {folder, file}) {
+    while (!path.empty()) {
+      const size_t slash = path.find('/');
+      const std::string_view segment = path.substr(0, slash);
+      path = slash == std::string_view::npos ? std::string_view() : path.substr(slash + 1);
+      if (segment.empty() || segment == ".") continue;
+      if (segment == "..") {
+        if (!segments.empty()) segments.pop_back();
+        continue;
+      }
+      std::string encoded;
+      for (char c : segment) {
+        const auto byte = static_cast<unsigned char>(c);
+        if (std::isalnum(byte) || c == '-' || c == '.' || c == '_' || c == '~') {
+          encoded.push_back(c);
+        } else {
+          encoded.push_back('%');
+          encoded.push_back(kHex[byte >> 4]);
+          encoded.push_back(kHex[byte & 0xF]);
+        }
+      }
+      segments.push_back(std::move(encoded));
     }
+  }
+  std::string uri;
+  for (const std::string& segment : segments) {
+    if (!uri.empty()) uri += '/';
+    uri += segment;
   }
   return uri;
 }
@@ -127,6 +156,9 @@ std::string MessageText(const Finding& finding) {
     text += finding.reference_value.empty() ? "(none)" : finding.reference_value;
     text += "\nChecked: ";
     text += finding.checked_value.empty() ? "(none)" : finding.checked_value;
+    if (finding.more_replacements > 0) {
+      text += "\n(and " + std::to_string(finding.more_replacements) + " more)";
+    }
   }
   return text;
 }
@@ -159,15 +191,22 @@ void WriteRules(JsonWriter& json) {
   json.EndArray();
 }
 
-void WriteLocation(const Finding& finding, JsonWriter& json) {
+void WriteLocation(const Finding& finding, std::string_view folder, JsonWriter& json) {
   json.BeginArray();
   json.BeginObject();
   json.Key("physicalLocation");
   json.BeginObject();
   json.Key("artifactLocation");
   json.BeginObject();
-  json.Member("uri", RelativeUri(finding.file));
+  json.Member("uri", RelativeUri(folder, finding.file));
+  json.Member("uriBaseId", kSourceRoot);
   json.EndObject();
+  if (finding.line > 0) {
+    json.Key("region");
+    json.BeginObject();
+    json.Member("startLine", finding.line);
+    json.EndObject();
+  }
   json.EndObject();
   json.Key("logicalLocations");
   json.BeginArray();
@@ -181,7 +220,8 @@ void WriteLocation(const Finding& finding, JsonWriter& json) {
   json.EndArray();
 }
 
-void WriteResult(const Finding& finding, const std::string& fingerprint, JsonWriter& json) {
+void WriteResult(const Finding& finding, const std::string& fingerprint, std::string_view folder,
+                 JsonWriter& json) {
   const MessageType& type = MessageTypeOf(finding.code);
   json.BeginObject();
   json.Member("ruleId", type.id);
@@ -192,7 +232,7 @@ void WriteResult(const Finding& finding, const std::string& fingerprint, JsonWri
   json.Member("text", MessageText(finding));
   json.EndObject();
   json.Key("locations");
-  WriteLocation(finding, json);
+  WriteLocation(finding, folder, json);
   json.Key("partialFingerprints");
   json.BeginObject();
   json.Member("zor2checkFinding/v1", fingerprint);
@@ -218,6 +258,7 @@ void WriteResult(const Finding& finding, const std::string& fingerprint, JsonWri
   json.Member("argument", finding.argument);
   json.Member("referenceValue", finding.reference_value);
   json.Member("checkedValue", finding.checked_value);
+  json.Member("moreReplacements", finding.more_replacements);
   json.EndObject();
   json.EndObject();
 }
@@ -228,14 +269,20 @@ void WriteRunProperties(const RunDescription& run, const RunSummary& summary, Js
   json.Member("checked", run.checked);
   json.Member("report", run.report);
   json.Member("options", run.options);
-  json.Member("verdict", summary.failed ? "failed" : "passed");
+  json.Member("verdict", VerdictName(VerdictOf(summary)));
   json.Member("findings", TotalFindings(summary));
   json.Member("accepted", summary.accepted);
   json.Member("files", summary.files);
   json.Member("frameworks", summary.frameworks);
   json.Member("pairsCompared", summary.pairs_compared);
   json.Member("pairsSkipped", summary.pairs_skipped);
-  json.Member("missingCounterparts", summary.missing_counterparts);
+  json.Member("filesChecked", summary.files_checked);
+  json.Member("nothingChecked", summary.nothing_checked);
+  std::vector<std::string> missing;
+  for (const Absence& absence : summary.missing_documents) missing.push_back(absence.name);
+  json.Member("missingCounterparts", missing);
+  json.Key("withoutCounterpart");
+  WriteAbsences(summary, json);
   json.Member("staleBaselineEntries", summary.stale_baseline_entries);
   json.EndObject();
 }
@@ -269,10 +316,41 @@ std::string ExportSarif(const RunDescription& run, const RunSummary& summary,
   WriteRules(json);
   json.EndObject();
   json.EndObject();
+  json.Key("originalUriBaseIds");
+  json.BeginObject();
+  json.Key(kSourceRoot);
+  json.BeginObject();
+  json.Key("description");
+  json.BeginObject();
+  json.Member("text", "The root of the repository, which every artifact's URI is relative to");
+  json.EndObject();
+  json.EndObject();
+  json.EndObject();
   json.Key("invocations");
   json.BeginArray();
   json.BeginObject();
-  json.Member("executionSuccessful", summary.pairs_skipped == 0);
+  // Whatever the run could not do makes the run unsuccessful, so that no
+  // service takes its results for a complete check.
+  json.Member("executionSuccessful", summary.failures.empty());
+  if (!summary.failures.empty()) {
+    json.Key("toolExecutionNotifications");
+    json.BeginArray();
+    for (const RunFailure& failure : summary.failures) {
+      json.BeginObject();
+      json.Member("level", "error");
+      json.Key("message");
+      json.BeginObject();
+      json.Member("text", failure.path + ": " + failure.reason);
+      json.EndObject();
+      json.Key("properties");
+      json.BeginObject();
+      json.Member("path", failure.path);
+      json.Member("reason", failure.reason);
+      json.EndObject();
+      json.EndObject();
+    }
+    json.EndArray();
+  }
   json.EndObject();
   json.EndArray();
   json.Key("results");
@@ -282,7 +360,7 @@ std::string ExportSarif(const RunDescription& run, const RunSummary& summary,
   for (const Finding& finding : findings) {
     std::string key = ChainKey(finding);
     const int occurrence = ++seen[key];
-    WriteResult(finding, Fingerprint(key, occurrence), json);
+    WriteResult(finding, Fingerprint(key, occurrence), run.sarif_base, json);
   }
   json.EndArray();
   json.Key("properties");

@@ -76,5 +76,31 @@ TEST(ExportSarifTest, AcceptedFindingsAreSuppressedWithTheirReason) {
   }
 }
 
+// Code-scanning services place an annotation by a URI relative to the root of
+// the repository: never absolute, never climbing out of it, "/" kept.
+TEST(ExportSarifTest, ArtifactsAreRelativeToTheFolderOfTheRepository) {
+  Finding finding = MethodFinding(MessageCode::kMRTHC, "int Run()");
+  RunDescription run;
+  run.sarif_base = "/include/./sub/";
+  const auto uri_of = [&](const std::string& file) {
+    finding.file = file;
+    const std::string sarif = ExportSarif(run, {}, {finding});
+    const size_t at = sarif.find("\"uri\":\"");
+    return sarif.substr(at + 7, sarif.find('"', at + 7) - at - 7);
+  };
+  EXPECT_EQ(uri_of("geo/Point.h"), "include/sub/geo/Point.h");
+  EXPECT_EQ(uri_of("/abs/../x/./geo//Point.h"), "include/sub/x/geo/Point.h");
+  EXPECT_EQ(uri_of("../../../../etc/a b:c.h"), "etc/a%20b%3Ac.h");
+  run.sarif_base.clear();
+  EXPECT_EQ(uri_of("/usr/include/Point.h"), "usr/include/Point.h");
+
+  // A declaration's line gives the region; without one there is none.
+  finding.line = 12;
+  EXPECT_NE(ExportSarif(run, {}, {finding}).find("\"region\":{\"startLine\":12}"),
+            std::string::npos);
+  finding.line = 0;
+  EXPECT_EQ(ExportSarif(run, {}, {finding}).find("\"region\""), std::string::npos);
+}
+
 }  // namespace
 }  // namespace zor2

@@ -139,7 +139,33 @@ std::string VerdictLine(const RunSummary& summary) {
   if (summary.accepted > 0) {
     accepted = " (" + std::to_string(summary.accepted) + " accepted by the baseline)";
   }
-  if (summary.failed) return "FAILED: " + CountOf(fresh, "new finding") + accepted;
+  if (VerdictOf(summary) == Verdict::kError) {
+    const size_t failures = summary.failures.size();
+    std::string line = "ERROR: the check is incomplete: " +
+                       (failures == 1 ? std::string("an input or output")
+                                      : std::to_string(failures) + " inputs or outputs") +
+                       " failed";
+    if (fresh > 0) line += "; " + CountOf(fresh, "new finding") + " so far";
+    return line;
+  }
+  if (summary.failed) {
+    std::vector<std::string> causes;
+    if (fresh > 0) causes.push_back(CountOf(fresh, "new finding"));
+    int documents = 0;
+    for (const Absence& absence : summary.missing_documents) documents += !absence.accepted;
+    int frameworks = 0;
+    for (const Absence& absence : summary.missing_frameworks) frameworks += !absence.accepted;
+    if (documents > 0) {
+      causes.push_back(CountOf(documents, "reference document") + " without counterpart");
+    }
+    if (frameworks > 0) {
+      causes.push_back(CountOf(frameworks, "reference framework") + " without counterpart");
+    }
+    if (summary.nothing_checked) causes.push_back("nothing was checked");
+    std::string line = "FAILED: ";
+    for (size_t i = 0; i < causes.size(); ++i) line += (i == 0 ? "" : ", ") + causes[i];
+    return line + accepted;
+  }
   if (total == 0) return "PASSED: no finding";
   if (fresh == 0) return "PASSED: " + CountOf(total, "finding") + ", all accepted by the baseline";
   return "PASSED: " + CountOf(total, "finding") + accepted;
@@ -154,20 +180,48 @@ std::string ScopeLine(const RunSummary& summary) {
   return line;
 }
 
+namespace {
+
+// "Reference documents without a checked counterpart, not compared: a.xml,
+// b.xml (accepted: "Retired")."
+std::string AbsencesNote(const std::vector<Absence>& absences, std::string_view what) {
+  std::string note = "Reference ";
+  note += what;
+  note += " without a checked counterpart, not compared: ";
+  for (size_t i = 0; i < absences.size(); ++i) {
+    if (i > 0) note += ", ";
+    note += absences[i].name;
+    if (absences[i].accepted) {
+      note +=
+          absences[i].reason.empty() ? " (accepted)" : " (accepted: " + absences[i].reason + ")";
+    }
+  }
+  return note + ".";
+}
+
+}  // namespace
+
 std::vector<std::string> SummaryNotes(const RunSummary& summary) {
   std::vector<std::string> notes;
+  for (const RunFailure& failure : summary.failures) {
+    notes.push_back("Failed: " + failure.path + ": " + failure.reason);
+  }
   if (summary.pairs_skipped > 0) {
     notes.push_back(CountOf(summary.pairs_skipped, "document pair") +
                     " could not be compared: an input could not be read or parsed, so findings "
                     "may be missing.");
   }
-  if (!summary.missing_counterparts.empty()) {
-    std::string note = "Reference documents without a checked counterpart, not compared: ";
-    for (size_t i = 0; i < summary.missing_counterparts.size(); ++i) {
-      if (i > 0) note += ", ";
-      note += summary.missing_counterparts[i];
-    }
-    notes.push_back(note + ".");
+  if (summary.nothing_checked) {
+    notes.push_back(summary.pairs_compared == 0
+                        ? "Nothing was checked: no document pair was compared."
+                        : "Nothing was checked: no reference file passed the file filter in any "
+                          "document pair.");
+  }
+  if (!summary.missing_documents.empty()) {
+    notes.push_back(AbsencesNote(summary.missing_documents, "documents"));
+  }
+  if (!summary.missing_frameworks.empty()) {
+    notes.push_back(AbsencesNote(summary.missing_frameworks, "frameworks"));
   }
   if (summary.stale_baseline_entries > 0) {
     const int stale = summary.stale_baseline_entries;
@@ -190,28 +244,36 @@ std::string PlaceInFile(const Finding& finding) {
   return place;
 }
 
-std::vector<FrameworkFindings> GroupByFrameworkAndFile(const std::vector<Finding>& findings) {
+std::vector<FrameworkFindings> GroupByFrameworkAndFile(
+    const std::vector<const Finding*>& findings) {
   std::vector<FrameworkFindings> frameworks;
   std::unordered_map<std::string, size_t> framework_index;
   // Per framework, the index of each file, keyed by group and name.
   std::vector<std::unordered_map<std::string, size_t>> file_index;
-  for (const Finding& finding : findings) {
+  for (const Finding* finding : findings) {
     auto [framework_it, new_framework] =
-        framework_index.try_emplace(finding.framework, frameworks.size());
+        framework_index.try_emplace(finding->framework, frameworks.size());
     if (new_framework) {
-      frameworks.push_back({finding.framework, {}});
+      frameworks.push_back({finding->framework, {}});
       file_index.emplace_back();
     }
     FrameworkFindings& framework = frameworks[framework_it->second];
-    std::string file_key = finding.group;
+    std::string file_key = finding->group;
     file_key += '\0';
-    file_key += finding.file;
+    file_key += finding->file;
     auto [file_it, new_file] =
         file_index[framework_it->second].try_emplace(file_key, framework.files.size());
-    if (new_file) framework.files.push_back({finding.group, finding.file, {}});
-    framework.files[file_it->second].findings.push_back(&finding);
+    if (new_file) framework.files.push_back({finding->group, finding->file, {}});
+    framework.files[file_it->second].findings.push_back(finding);
   }
   return frameworks;
+}
+
+std::vector<FrameworkFindings> GroupByFrameworkAndFile(const std::vector<Finding>& findings) {
+  std::vector<const Finding*> all;
+  all.reserve(findings.size());
+  for (const Finding& finding : findings) all.push_back(&finding);
+  return GroupByFrameworkAndFile(all);
 }
 
 }  // namespace zor2

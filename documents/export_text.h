@@ -30,15 +30,17 @@ std::string HelpAsText(std::string_view help);
 std::string CountOf(int count, std::string_view noun);
 
 // The verdict in one line: "FAILED: 3 new findings (1 accepted by the
-// baseline)", "PASSED: no finding", ...
+// baseline)", "PASSED: no finding", "ERROR: the check is incomplete: an input
+// or output failed", ...
 std::string VerdictLine(const RunSummary& summary);
 
 // Where the findings sit and what was compared, in one sentence.
 std::string ScopeLine(const RunSummary& summary);
 
-// The sentences that need a reader's attention beyond the findings: pairs
-// skipped for an error, reference documents without counterpart, baseline
-// entries that matched nothing. Empty when there are none.
+// The sentences that need a reader's attention beyond the findings: what
+// failed, pairs skipped for an error, nothing checked, reference documents and
+// frameworks without counterpart, baseline entries that matched nothing.
+// Empty when there are none.
 std::vector<std::string> SummaryNotes(const RunSummary& summary);
 
 // Where a finding sits below its file, for a reader: "class GeoPoint, double
@@ -59,5 +61,6 @@ struct FrameworkFindings {
 // The findings grouped by framework, then by group and file, each in the order
 // of its first finding; the findings keep their order inside a file.
 std::vector<FrameworkFindings> GroupByFrameworkAndFile(const std::vector<Finding>& findings);
+std::vector<FrameworkFindings> GroupByFrameworkAndFile(const std::vector<const Finding*>& findings);
 
 }  // namespace zor2

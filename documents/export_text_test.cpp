@@ -94,5 +94,27 @@ TEST(VerdictLineTest, NamesTheFindingsThatCountAgainstTheRun) {
   EXPECT_EQ(VerdictLine(summary), "PASSED: 3 findings, all accepted by the baseline");
 }
 
+// What fails a check besides findings is named, and a run that could not do
+// all it was asked never passes.
+TEST(VerdictLineTest, NamesEveryCauseAndPutsFailuresFirst) {
+  RunSummary summary;
+  summary.missing_documents.emplace_back("Legacy.xml");
+  summary.missing_frameworks.emplace_back("Sketch");
+  summary.missing_frameworks.emplace_back("Old");
+  summary.missing_frameworks.back().accepted = true;
+  summary.nothing_checked = true;
+  SettleVerdict(&summary);
+  EXPECT_EQ(VerdictOf(summary), Verdict::kFailed);
+  EXPECT_EQ(VerdictLine(summary),
+            "FAILED: 1 reference document without counterpart, 1 reference framework without "
+            "counterpart, nothing was checked");
+  summary.failures.push_back({"ref", "No such file or directory"});
+  EXPECT_EQ(VerdictOf(summary), Verdict::kError);
+  EXPECT_EQ(VerdictLine(summary), "ERROR: the check is incomplete: an input or output failed");
+  summary = RunSummary();
+  SettleVerdict(&summary);
+  EXPECT_EQ(VerdictName(VerdictOf(summary)), std::string("passed"));
+}
+
 }  // namespace
 }  // namespace zor2

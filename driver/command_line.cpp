@@ -30,12 +30,15 @@ constexpr std::string_view kUsage =
 // "-h" shows them after the usage text above, which usage errors show alone.
 constexpr std::string_view kMoreUsage =
     "   -summary        : Print one line counting the findings\n"
-    "   -fail           : Exit with status 3 when a finding is not accepted (implies -summary)\n"
+    "   -fail           : Exit with status 3 when the check does not pass (implies -summary)\n"
     "   -baseline FILE  : Accept the findings listed in FILE, an earlier report\n"
     "   -export PATH    : Also write the findings to PATH, as .json, .sarif, .md or .html\n"
     "                     (may be repeated)\n"
+    "   -markdown-full  : Write every finding to a .md export, past 65 536 characters\n"
+    "   -sarif-base DIR : The folder of the repository that file names are relative to,\n"
+    "                     for a .sarif export\n"
     "Exit status : 0 done, 1 usage error, 2 an input or output failed,\n"
-    "              3 with -fail, findings not accepted by the baseline\n";
+    "              3 with -fail, the check did not pass\n";
 
 // Writes the pieces and a line end. Pieces are written by length, so that an
 // item read from an argument file is shown whole whatever bytes it holds.
@@ -52,14 +55,18 @@ struct OptionScan {
   bool failed = false;
 };
 
-// Fills `items` from the argument file (the arguments "=" and a path) or else
-// from the arguments themselves. False when the argument file cannot be read.
+// Fills `items` from the argument file (the arguments "=" and a path), whose
+// path then goes to `argument_file`, or else from the arguments themselves.
+// False when the argument file cannot be read.
 bool CollectItems(int argc, const char* const* argv, std::string_view program,
-                  std::vector<std::string>* items) {
+                  std::vector<std::string>* items, std::optional<std::string>* argument_file) {
   std::string err;
-  if (argc == 3 && std::strcmp(argv[1], "=") == 0 && !ReadArgumentFile(argv[2], items, &err)) {
-    WriteLine(stderr, {program, ": unable to read file ", PrintablePath(argv[2])});
-    return false;
+  if (argc == 3 && std::strcmp(argv[1], "=") == 0) {
+    if (!ReadArgumentFile(argv[2], items, &err)) {
+      WriteLine(stderr, {program, ": unable to read file ", PrintablePath(argv[2])});
+      return false;
+    }
+    if (!items->empty()) *argument_file = argv[2];
   }
   // An argument file without any item counts as no argument file.
   if (items->empty()) {
@@ -95,6 +102,10 @@ bool TakeValue(const std::string& option, const std::string& value, OptionScan* 
   }
   if (option == "-baseline") {
     config->baseline_path = value;
+    return true;
+  }
+  if (option == "-sarif-base") {
+    config->sarif_base = value;
     return true;
   }
   if (option == "-export") {
@@ -134,6 +145,10 @@ std::optional<ExitStatus> ScanOptions(const std::vector<std::string>& items, Opt
       config->settings.only_flagged_files = true;
       continue;
     }
+    if (item == "-markdown-full") {
+      config->markdown_full = true;
+      continue;
+    }
     if (item == "-summary" || item == "-fail") {
       config->summary = true;
       config->fail = config->fail || item == "-fail";
@@ -161,9 +176,9 @@ void CheckMandatoryOptions(OptionScan* scan) {
 }
 
 void AnnounceRun(const RunConfiguration& config, Log& log) {
-  log.Progress() << "## Ref : " << PrintablePath(config.reference_path);
-  log.Progress() << "## Checked : " << PrintablePath(config.checked_path);
-  log.Progress() << "## Output : " << PrintablePath(config.output_path);
+  log.Progress() << "## Ref : " << config.reference_path;
+  log.Progress() << "## Checked : " << config.checked_path;
+  log.Progress() << "## Output : " << config.output_path;
 }
 
 void FixLevel(const std::optional<std::string>& level_text, CheckSettings* settings, Log& log) {
@@ -190,7 +205,9 @@ std::optional<ExitStatus> ReadCommandLine(int argc, const char* const* argv,
   scan.program = argc > 0 && argv[0] != nullptr ? argv[0] : "";
 
   std::vector<std::string> items;
-  if (!CollectItems(argc, argv, scan.program, &items)) return ExitStatus::kUsageError;
+  if (!CollectItems(argc, argv, scan.program, &items, &config->argument_file_path)) {
+    return ExitStatus::kUsageError;
+  }
   config->items = items;
   if (std::optional<ExitStatus> help = ScanOptions(items, &scan, config)) return help;
   CheckMandatoryOptions(&scan);

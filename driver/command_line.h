@@ -17,10 +17,13 @@ struct RunConfiguration {
   std::optional<std::string> help_page_path;  // "-htm", unless given ""
   CheckSettings settings;                     // "-L" and "-level"
   bool summary = false;                       // "-summary", also set by "-fail"
-  bool fail = false;                          // "-fail": status 3 for findings not accepted
+  bool fail = false;                          // "-fail": status 3 when the check does not pass
   std::optional<std::string> baseline_path;   // "-baseline"
   std::vector<std::string> export_paths;      // "-export", in their order
-  std::vector<std::string> items;             // the command line as read, for the exports
+  bool markdown_full = false;      // "-markdown-full": the Markdown export holds every finding
+  std::string sarif_base;          // "-sarif-base": the folder file names are relative to
+  std::vector<std::string> items;  // the command line as read, for the exports
+  std::optional<std::string> argument_file_path;  // "= PATH", when its items were read
 };
 
 // Reads the program's arguments (`argv[0]` is the program name; `argv` holds

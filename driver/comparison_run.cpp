@@ -16,8 +16,9 @@
 // - the documents of a compared large pair are freed by a task (small ones on
 //   the main thread); those of the last pair only once the outputs are
 //   written, so that freeing them does not slow the writing;
-// - once every finding is final, each export is made and written by a task,
-//   while the main thread writes the report.
+// - once every finding is final, each export is made and written by a task
+//   (WriteExports), from a copy of the summary, while the main thread writes
+//   the report.
 // No thread ever waits by spinning. So the report and every log line are the
 // same, byte for byte, as a single-threaded run's.
 
@@ -30,15 +31,16 @@
 #include <cstring>
 #include <iterator>
 #include <memory>
+#include <new>
 #include <optional>
 #include <string>
 #include <utility>
 #include <vector>
 
 #include "documents/baseline.h"
-#include "documents/exports.h"
 #include "documents/help_page.h"
 #include "documents/run_summary.h"
+#include "driver/export_writing.h"
 #include "driver/pair_loading.h"
 #include "platform/tools/executor.h"
 #include "platform/tools/file_output.h"
@@ -51,6 +53,10 @@
 
 namespace zor2 {
 namespace {
+
+// What an ERROR line names when the findings could not be counted.
+constexpr const char* kSummary = "summary";
+constexpr const char* kNoMemoryForSummary = "not enough memory to count the findings";
 
 enum class InputMode { kFilePair, kDirectoryPair, kUnusable };
 
@@ -73,15 +79,12 @@ class ComparisonRun {
   ExitStatus Run() {
     ReadBaseline();
     CompareInputs();
-    AcceptBaselineFindings();
-    std::vector<Executor::Handle<std::string>> exports = StartExports();
-    WriteReport();
-    WriteHelpPage();
-    FinishExports(exports);
+    FinishSummary();
+    WriteOutputs();
     // Freed only now: unmapping large documents while the outputs are written
     // would slow the writing down more than it takes.
     last_pair_ = LoadedPair();
-    if (config_.summary) log_.Progress() << SummaryLine(summary_);
+    if (config_.summary) WriteSummaryLine();
     if (incomplete_) return ExitStatus::kIncomplete;
     if (config_.fail && summary_.failed) return ExitStatus::kFindingsNotAccepted;
     return ExitStatus::kDone;
@@ -91,8 +94,14 @@ class ComparisonRun {
   // Names `path` and why it failed in an "ERROR: " line; the run's result is
   // then incomplete. Every failure of a run is reported here.
   void ReportFailure(const std::string& path, const std::string& reason) {
-    log_.Warning() << "ERROR: " << PrintablePath(path) << ": " << reason;
+    log_.Warning() << "ERROR: " << path << ": " << reason;
     incomplete_ = true;
+    // The exports state every failure; without the memory to keep it, the
+    // run's status still says it.
+    try {
+      summary_.failures.push_back({path, reason});
+    } catch (const std::bad_alloc&) {
+    }
   }
 
   void CompareInputs() {
@@ -150,12 +159,13 @@ class ComparisonRun {
   void CompareDirectories() {
     std::vector<PairReader::Paths> pairs;
     summary_.directory_mode = true;
+    std::vector<std::string> missing;
     std::string err;
-    if (!ListDocumentPairs(config_.reference_path, config_.checked_path, &pairs,
-                           &summary_.missing_counterparts, &err)) {
+    if (!ListDocumentPairs(config_.reference_path, config_.checked_path, &pairs, &missing, &err)) {
       ReportFailure(config_.reference_path, err);
       return;
     }
+    for (std::string& name : missing) summary_.missing_documents.emplace_back(std::move(name));
     ComparePairs(std::move(pairs));
   }
 
@@ -188,6 +198,10 @@ class ComparisonRun {
       // the documents.
       findings_.insert(findings_.end(), std::make_move_iterator(collector.findings().begin()),
                        std::make_move_iterator(collector.findings().end()));
+      summary_.files_checked += collector.files_checked();
+      for (std::string& name : collector.missing_frameworks()) {
+        summary_.missing_frameworks.emplace_back(std::move(name));
+      }
     } else {
       ++summary_.pairs_skipped;
     }
@@ -230,48 +244,69 @@ class ComparisonRun {
     ReportReadError(*config_.baseline_path, error);
   }
 
-  // Marks the findings that the baseline accepts, names its entries that
-  // match no finding any more, and counts.
-  void AcceptBaselineFindings() {
+  // Marks the findings, documents and frameworks that the baseline accepts,
+  // names its entries that match nothing any more, counts, and settles the
+  // verdict. Running out of memory here is a failure of the run, not an end.
+  void FinishSummary() {
     if (!collecting_) return;
-    summary_.baseline = config_.baseline_path.has_value();
-    if (baseline_) {
-      baseline_->Accept(&findings_);
-      const std::vector<std::string> stale = baseline_->StaleEntries();
-      for (const std::string& entry : stale) {
-        log_.Warning() << "WARNING: " << *config_.baseline_path << ": no longer found: " << entry;
+    try {
+      summary_.baseline = config_.baseline_path.has_value();
+      if (baseline_) {
+        baseline_->Accept(&findings_);
+        for (Absence& document : summary_.missing_documents) {
+          baseline_->Accept("Document", &document);
+        }
+        for (Absence& framework : summary_.missing_frameworks) {
+          baseline_->Accept("Framework", &framework);
+        }
+        const std::vector<std::string> stale = baseline_->StaleEntries();
+        for (const std::string& entry : stale) {
+          log_.Warning() << "WARNING: " << *config_.baseline_path << ": no longer found: " << entry;
+        }
+        summary_.stale_baseline_entries = static_cast<int>(stale.size());
       }
-      summary_.stale_baseline_entries = static_cast<int>(stale.size());
+      CountFindings(findings_, &summary_);
+      summary_.nothing_checked = summary_.files_checked == 0;
+      SettleVerdict(&summary_);
+    } catch (const std::bad_alloc&) {
+      ReportFailure(kSummary, kNoMemoryForSummary);
     }
-    CountFindings(findings_, &summary_);
-    summary_.failed = summary_.not_accepted > 0;
+    // Without a pair compared, the ERROR lines already say why nothing was.
+    if (config_.summary && summary_.nothing_checked &&
+        (summary_.pairs_compared > 0 || !incomplete_)) {
+      log_.Warning() << "WARNING: nothing was checked: "
+                     << NothingCheckedReason(summary_, config_.settings.only_flagged_files);
+    }
   }
 
-  // Each export is made and written on a thread of its own while the report
-  // is written; they only read the findings, which no longer change. Each
-  // task answers why its export could not be written, or nothing.
-  std::vector<Executor::Handle<std::string>> StartExports() {
-    std::vector<Executor::Handle<std::string>> exports;
-    if (config_.export_paths.empty()) return exports;
-    run_ = RunDescription{std::string("zor2check ") + kVersion, config_.reference_path,
-                          config_.checked_path, config_.output_path, config_.items};
-    for (const std::string& path : config_.export_paths) {
-      exports.push_back(executor_.Submit([this, &path] {
-        std::string err;
-        const std::string text = ExportText(*ExportFormatOf(path), run_, summary_, findings_);
-        return WriteFileAtomically(path, text, nullptr, &err) ? std::string() : err;
-      }));
+  void WriteSummaryLine() {
+    try {
+      log_.Progress() << SummaryLine(summary_);
+    } catch (const std::bad_alloc&) {
+      ReportFailure(kSummary, kNoMemoryForSummary);
     }
-    return exports;
   }
 
-  // Names the exports that could not be written, in the order they were asked
-  // for.
-  void FinishExports(std::vector<Executor::Handle<std::string>>& exports) {
-    for (size_t i = 0; i < exports.size(); ++i) {
-      const std::string err = exports[i].Get();
-      if (!err.empty()) ReportFailure(config_.export_paths[i], err);
-    }
+  // Writes the report and the help page here while tasks make and write the
+  // exports, which only read the findings: these no longer change.
+  void WriteOutputs() {
+    run_ = RunDescription{std::string("zor2check ") + kVersion,
+                          config_.reference_path,
+                          config_.checked_path,
+                          config_.output_path,
+                          config_.items,
+                          config_.export_paths,
+                          config_.markdown_full,
+                          config_.sarif_base};
+    WriteExports(
+        config_.export_paths, run_, findings_, &summary_, executor_,
+        [this] {
+          WriteReport();
+          WriteHelpPage();
+        },
+        [this](const std::string& path, const std::string& reason) {
+          ReportFailure(path, reason);
+        });
   }
 
   void WriteReport() {
@@ -290,7 +325,7 @@ class ComparisonRun {
     std::string err;
     if (WriteFileAtomically(path, HelpPageText(), &opened, &err)) return;
     // The page's long-standing line comes first when it cannot even be opened.
-    if (!opened) log_.Warning() << "Unable to open file " << PrintablePath(path);
+    if (!opened) log_.Warning() << "Unable to open file " << path;
     ReportFailure(path, err);
   }
 

@@ -3,9 +3,11 @@
 #include <sys/stat.h>
 
 #include <filesystem>
+#include <system_error>
 #include <vector>
 
 #include "driver/pair_loading.h"
+#include "platform/tools/file_output.h"
 #include "platform/tools/paths.h"
 #include "platform/tools/printable_path.h"
 
@@ -21,24 +23,40 @@ struct RunFile {
   bool regular = false;
   dev_t device = 0;
   ino_t inode = 0;
+  std::string destination;  // for a file that does not exist: where it would be
 };
 
+// Where a file that does not exist yet would be written: its links followed
+// as the writer follows them, then its directory resolved, and its name; so
+// that "out.md", "$PWD/out.md" and "here/out.md" with "here -> ." are one.
+std::string Destination(const std::string& path) {
+  if (path.empty()) return path;
+  std::string target;
+  if (!FinalTarget(path, &target)) target = path;
+  std::error_code error;
+  const std::filesystem::path absolute = std::filesystem::absolute(target, error);
+  if (error) return std::filesystem::path(target).lexically_normal();
+  const std::filesystem::path resolved = std::filesystem::weakly_canonical(absolute, error);
+  return error ? absolute.lexically_normal().string() : resolved.string();
+}
+
 RunFile Identify(const std::string& path, const char* role, const char* option) {
-  RunFile file{path, role, option};
+  RunFile file{path, role, option, false, false, 0, 0, {}};
   struct stat status;
   if (::stat(path.c_str(), &status) == 0) {
     file.exists = true;
     file.regular = S_ISREG(status.st_mode);
     file.device = status.st_dev;
     file.inode = status.st_ino;
+  } else {
+    file.destination = Destination(path);
   }
   return file;
 }
 
 bool SameFile(const RunFile& a, const RunFile& b) {
   if (a.exists && b.exists) return a.device == b.device && a.inode == b.inode;
-  return std::filesystem::path(a.path).lexically_normal() ==
-         std::filesystem::path(b.path).lexically_normal();
+  return !a.exists && !b.exists && a.destination == b.destination;
 }
 
 std::string Describe(const RunFile& file) {
@@ -63,6 +81,9 @@ std::optional<std::string> FindOutputClash(const RunConfiguration& config) {
   inputs.push_back(Identify(config.checked_path, "the checked document", "-c"));
   if (config.baseline_path) {
     inputs.push_back(Identify(*config.baseline_path, "the baseline", "-baseline"));
+  }
+  if (config.argument_file_path) {
+    inputs.push_back(Identify(*config.argument_file_path, "the argument file", "="));
   }
   if (IsDirectory(config.reference_path) && IsDirectory(config.checked_path)) {
     std::vector<PairReader::Paths> pairs;

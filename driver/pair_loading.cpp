@@ -2,6 +2,7 @@
 
 #include <sys/stat.h>
 
+#include <cerrno>
 #include <new>
 #include <optional>
 
@@ -17,6 +18,13 @@ std::optional<uintmax_t> RegularFileSize(const std::string& path) {
   struct stat status;
   if (::stat(path.c_str(), &status) != 0 || !S_ISREG(status.st_mode)) return std::nullopt;
   return static_cast<uintmax_t>(status.st_size);
+}
+
+// Something stands at `path`, a link that leads nowhere included; a path that
+// cannot be looked at counts as there, so that its load names the reason.
+bool Exists(const std::string& path) {
+  struct stat status;
+  return ::lstat(path.c_str(), &status) == 0 || (errno != ENOENT && errno != ENOTDIR);
 }
 
 }  // namespace
@@ -56,6 +64,11 @@ bool ListDocumentPairs(const std::string& reference_dir, const std::string& chec
     // what they open.
     if (const std::optional<uintmax_t> checked_bytes = RegularFileSize(checked)) {
       const uintmax_t bytes = RegularFileSize(entry).value_or(0) + *checked_bytes;
+      pairs->push_back({std::move(entry), std::move(checked), bytes});
+    } else if (Exists(checked)) {
+      // Whatever else stands under the name (a dangling link, a directory, a
+      // pipe) is the counterpart, which then fails to load and says why.
+      const uintmax_t bytes = RegularFileSize(entry).value_or(0);
       pairs->push_back({std::move(entry), std::move(checked), bytes});
     } else if (missing != nullptr) {
       missing->push_back(std::move(name));

@@ -92,9 +92,10 @@ class PairReader {
 PairReader::Paths DocumentPair(std::string reference, std::string checked);
 
 // Appends the pairs of a directory run to `pairs`: each regular file of
-// `reference_dir` whose name is also a regular file of `checked_dir`, in the
-// order of the listing; the names of the others go to `missing` unless it is
-// null. False with the system's reason in `err` when `reference_dir` cannot be
+// `reference_dir` and whatever stands under its name in `checked_dir` (a
+// dangling link or a directory too, which then fails to load), in the order
+// of the listing; the names of those without anything there go to `missing`
+// unless it is null. False with the system's reason in `err` when `reference_dir` cannot be
 // listed.
 bool ListDocumentPairs(const std::string& reference_dir, const std::string& checked_dir,
                        std::vector<PairReader::Paths>* pairs, std::vector<std::string>* missing,

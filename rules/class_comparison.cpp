@@ -26,6 +26,7 @@ void CompareClasses(const xml::Element& reference, const xml::Element& checked,
       AddError(report_class, MessageCode::kCHBD);
       continue;
     }
+    report_class.SetCounterpart(counterpart);
     // Read once for both method rules.
     const std::vector<MethodRecord> reference_methods = ReadClassMethods(*cls);
     const std::vector<MethodRecord> checked_methods = ReadClassMethods(*counterpart);

@@ -103,6 +103,7 @@ void CompareInterfaceFiles(const xml::Element& reference, const xml::Element& ch
   const char* required = settings.only_flagged_files ? "@ZOR2Level" : "Aut";
   for (const xml::Element* file : GroupFiles(reference, group, required)) {
     if (!PassesFileFilter(*file, settings)) continue;
+    if (FindingCollector* collector = report.collector()) collector->CountCheckedFiles(1);
     ReportMirror report_file(report_group, "File");
     MirrorFile(report_file, *file, settings);
 
@@ -113,6 +114,7 @@ void CompareInterfaceFiles(const xml::Element& reference, const xml::Element& ch
       }
       continue;
     }
+    report_file.SetCounterpart(counterpart);
     bool check_new_pure_virtual = false;
     if (settings.only_flagged_files) {
       const bool exempt = RecentlyDeprecatedFile(*file, settings.current_level);

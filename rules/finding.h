@@ -25,6 +25,13 @@ struct Finding {
   // each element of its chain, followed by its ID: what a baseline matches
   // (filled only for a run with a baseline).
   std::string report_path;
+  // MHBDM: how many more checked methods of the same name there are than
+  // the likely replacements the checked value shows.
+  int more_replacements = 0;
+  // The 1-based line, in the checked file, of the declaration the finding is
+  // about, or of the innermost one still there (the class of a deleted
+  // method): the "Line" of the checked element; 0 when none says.
+  int line = 0;
 };
 
 // One step of a report path: `tag`, its "Name" and, for a "Method", its
@@ -53,6 +60,14 @@ class FindingCollector {
   std::vector<Finding>& findings() { return findings_; }
   bool report_paths() const { return report_paths_; }
 
+  // What was checked beside the findings: the reference files that passed
+  // the file filter, and the reference frameworks without counterpart (by
+  // name, as written).
+  void CountCheckedFiles(int count) { files_checked_ += count; }
+  int files_checked() const { return files_checked_; }
+  void NoteMissingFramework(const char* name) { missing_frameworks_.push_back(AsWritten(name)); }
+  std::vector<std::string>& missing_frameworks() { return missing_frameworks_; }
+
   // A collector for part of the same comparison, with the same documents.
   FindingCollector Part() const { return FindingCollector(reference_, checked_, report_paths_); }
 
@@ -61,6 +76,8 @@ class FindingCollector {
   const xml::OriginalValues* checked_;
   bool report_paths_;
   std::vector<Finding> findings_;
+  int files_checked_ = 0;
+  std::vector<std::string> missing_frameworks_;
 };
 
 }  // namespace zor2

@@ -53,6 +53,7 @@ void CommitDone(std::vector<FrameworkPair>& pairs, size_t& committed, xml::Outpu
     pair.log.ReplayInto(log);
     if (pair.mirror != nullptr) report.AddChild(std::move(pair.mirror));
     if (collector != nullptr) {
+      collector->CountCheckedFiles(pair.findings->files_checked());
       std::vector<Finding>& found = pair.findings->findings();
       collector->findings().insert(collector->findings().end(),
                                    std::make_move_iterator(found.begin()),
@@ -70,8 +71,12 @@ void CompareFrameworks(const xml::Element& reference, const xml::Element& checke
   std::vector<const xml::Element*> references;
   std::vector<const xml::Element*> counterparts;
   for (const xml::Element* framework : ChildElements(reference, "Framework")) {
-    const xml::Element* counterpart = checked_frameworks.Find(framework->FindAttribute("Name"));
-    if (counterpart == nullptr) continue;
+    const char* name = framework->FindAttribute("Name");
+    const xml::Element* counterpart = checked_frameworks.Find(name);
+    if (counterpart == nullptr) {
+      if (collector != nullptr) collector->NoteMissingFramework(name);
+      continue;
+    }
     references.push_back(framework);
     counterparts.push_back(counterpart);
   }

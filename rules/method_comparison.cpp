@@ -4,6 +4,7 @@
 #include <cstring>
 #include <string>
 
+#include "rules/likely_replacements.h"
 #include "rules/method_lists.h"
 #include "rules/pairing_index.h"
 
@@ -67,25 +68,6 @@ void CompareArguments(const MethodRecord& m, const MethodRecord& n, ReportMirror
   }
 }
 
-// The signatures of the methods of `cls` named `name`, the likely
-// replacements of a deleted method, one per line.
-std::string SignaturesNamed(const xml::Element& cls, const char* name,
-                            const FindingCollector& shown) {
-  std::string signatures;
-  if (name == nullptr) return signatures;
-  for (const xml::Element* child = cls.first_child(); child; child = child->next_sibling()) {
-    const char* child_name = child->FindAttribute("Name");
-    const char* signature = child->FindAttribute("Signature");
-    if (std::strcmp(child->tag(), "Method") != 0 || signature == nullptr || child_name == nullptr ||
-        std::strcmp(child_name, name) != 0) {
-      continue;
-    }
-    if (!signatures.empty()) signatures += '\n';
-    signatures += shown.AsWritten(signature);
-  }
-  return signatures;
-}
-
 // The rules for a reference method m at position i whose counterpart n is at
 // position j of the checked list.
 void CompareMethodPair(const MethodRecord& m, size_t i, const MethodRecord& n, size_t j,
@@ -138,6 +120,7 @@ void CompareMethods(const xml::Element& reference, const xml::Element& checked,
   const bool automation = StartsWith(checked_aut, 'Y');
   bool order_reported = false;
   const MethodIndex counterparts(checked_list);
+  LikelyReplacements replacements(checked_methods);
   for (size_t i = 0; i < reference_list.size(); ++i) {
     const MethodRecord& m = *reference_list[i];
     if (PassedOverAsDeprecated(m, settings.current_level)) continue;
@@ -146,11 +129,13 @@ void CompareMethods(const xml::Element& reference, const xml::Element& checked,
     MirrorMethod(report_method, m);
     if (j == MethodIndex::npos) {
       AddError(report_method, MessageCode::kMHBDM, [&](const FindingCollector& shown) {
-        return ComparedValues{shown.AsWritten(m.signature),
-                              SignaturesNamed(checked, m.name, shown)};
+        ComparedValues values{shown.AsWritten(m.signature), {}, 0};
+        values.checked = replacements.Signatures(m.name, m.signature, shown, &values.more_checked);
+        return values;
       });
       continue;
     }
+    report_method.SetCounterpart(checked_list[j]->element);
     CompareMethodPair(m, i, *checked_list[j], j, automation, order_reported, report_method, log);
   }
 }

@@ -20,6 +20,7 @@ void CheckNewPureVirtualMethods(const std::vector<MethodRecord>& reference_metho
     if (declared.Contains(n)) continue;
     ReportMirror report_method(report, "Method");
     MirrorMethod(report_method, n);
+    report_method.SetCounterpart(n.element);
     AddError(report_method, MessageCode::kNPVM);
   }
 }

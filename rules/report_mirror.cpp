@@ -1,5 +1,6 @@
 #include "rules/report_mirror.h"
 
+#include <climits>
 #include <cstdlib>
 #include <cstring>
 #include <string>
@@ -43,10 +44,28 @@ FindingCollector* ReportMirror::collector() const {
   return top->collector_;
 }
 
+namespace {
+
+// A "Line" value: a positive decimal number that fits, else 0.
+int LineNumber(const char* text) {
+  if (text == nullptr || *text == '\0') return 0;
+  int line = 0;
+  for (const char* c = text; *c != '\0'; ++c) {
+    if (*c < '0' || *c > '9' || line > (INT_MAX - (*c - '0')) / 10) return 0;
+    line = line * 10 + (*c - '0');
+  }
+  return line;
+}
+
+}  // namespace
+
 void ReportMirror::Locate(Finding* finding) const {
   const FindingCollector* shown = collector();
   std::vector<std::string> steps;  // from this mirror up
   for (const ReportMirror* mirror = this; mirror != nullptr; mirror = mirror->parent_) {
+    if (finding->line == 0 && mirror->counterpart_ != nullptr) {
+      finding->line = LineNumber(mirror->counterpart_->FindAttribute("Line"));
+    }
     if (mirror->tag_ == nullptr) continue;  // the report root
     const std::string_view tag = mirror->tag_;
     std::string name = shown->AsWritten(mirror->name_);

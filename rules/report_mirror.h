@@ -3,6 +3,8 @@
 #include <array>
 #include <cstddef>
 #include <memory>
+#include <string>
+#include <utility>
 
 #include "platform/xml/output_element.h"
 #include "rules/finding.h"
@@ -45,6 +47,12 @@ class ReportMirror {
   // not exist yet.
   xml::OutputElement* Element();
 
+  // The checked element that the mirrored element pairs with (or, for a new
+  // element, the checked element itself), whose "Line" places the findings
+  // under it, when nothing below says better. `checked` must outlive the
+  // mirror.
+  void SetCounterpart(const xml::Element* checked) { counterpart_ = checked; }
+
   // Where findings recorded under this mirror are collected, or null.
   FindingCollector* collector() const;
   // Fills the location of `finding` from this mirror and its ancestors.
@@ -63,6 +71,7 @@ class ReportMirror {
   const char* tag_ = nullptr;
   const char* name_ = nullptr;       // its "Name", for findings
   const char* signature_ = nullptr;  // its "Signature", for findings
+  const xml::Element* counterpart_ = nullptr;
   xml::OutputElement* element_ = nullptr;
   std::array<Attribute, kMaxPendingAttributes> pending_{};
   size_t pending_count_ = 0;
@@ -70,8 +79,14 @@ class ReportMirror {
 
 // What a rule compared for a finding, as the documents wrote it.
 struct ComparedValues {
+  ComparedValues(std::string reference_value, std::string checked_value, int more = 0)
+      : reference(std::move(reference_value)),
+        checked(std::move(checked_value)),
+        more_checked(more) {}
+
   std::string reference;
   std::string checked;
+  int more_checked;  // checked values left out of `checked`, as counted
 };
 
 // Records a finding of type `code` under `parent`: an "Error" element with
@@ -87,6 +102,7 @@ void AddError(ReportMirror& parent, MessageCode code, Describe describe) {
     ComparedValues values = describe(*parent.collector());
     finding->reference_value = std::move(values.reference);
     finding->checked_value = std::move(values.checked);
+    finding->more_replacements = values.more_checked;
   }
 }
 

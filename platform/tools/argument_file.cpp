@@ -1,38 +1,14 @@
 #include "platform/tools/argument_file.h"
 
-#include <fcntl.h>
-#include <unistd.h>
-
 #include <cerrno>
 #include <cstring>
 #include <iterator>
 #include <new>
 
-#include "platform/tools/file_descriptor.h"
+#include "platform/tools/file_input.h"
 
 namespace zor2 {
 namespace {
-
-// Reads the whole file into `content`; false with errno set when it cannot be
-// opened or read (a directory opens but fails to read).
-bool ReadWholeFile(const std::string& path, std::string* content) {
-  FileDescriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC));
-  if (!file.valid()) return false;
-  constexpr size_t kChunk = 1 << 16;
-  size_t used = 0;
-  for (;;) {
-    content->resize(used + kChunk);
-    ssize_t got = ::read(file.get(), content->data() + used, kChunk);
-    if (got < 0) {
-      if (errno == EINTR) continue;
-      return false;
-    }
-    if (got == 0) break;
-    used += static_cast<size_t>(got);
-  }
-  content->resize(used);
-  return true;
-}
 
 bool IsBlank(char c) {
   return c == ' ' || c == '\t' || c == '\r' || c == '\n';
@@ -63,14 +39,21 @@ void SplitItems(const std::string& content, std::vector<std::string>* items) {
 }  // namespace
 
 bool ReadArgumentFile(const std::string& path, std::vector<std::string>* items, std::string* err) {
-  // A file that does not fit in memory (one that never ends, as /dev/zero)
-  // cannot be read either.
+  // Read like a document: a pipe or a device (one that never ends, as
+  // /dev/zero) is refused without waiting, as is a file that cannot fit.
   try {
     std::string content;
-    if (!ReadWholeFile(path, &content)) {
-      *err = std::strerror(errno);
+    const ReadRoom room = [&content](size_t size, size_t) {
+      content.resize(size);
+      return content.data();
+    };
+    size_t length = 0;
+    FileReadError error;
+    if (!ReadRegularFile(path, room, &length, &error)) {
+      *err = std::move(error.reason);
       return false;
     }
+    content.resize(length);
     std::vector<std::string> read;
     SplitItems(content, &read);
     items->insert(items->end(), std::make_move_iterator(read.begin()),

@@ -102,32 +102,6 @@ std::string DirectoryOf(const std::string& path) {
   return slash == std::string::npos ? "" : path.substr(0, slash + 1);
 }
 
-// Sets `target` to the file that `path` finally names, its symbolic links
-// followed (the last one may dangle), or to `path` when it is no link. False
-// with errno set when a link cannot be read or the links loop.
-bool FinalTarget(const std::string& path, std::string* target) {
-  *target = path;
-  // The kernel's own limit on the links of one path.
-  for (int links = 0; links < 40; ++links) {
-    struct stat status;
-    if (::lstat(target->c_str(), &status) != 0 || !S_ISLNK(status.st_mode)) return true;
-    std::string text(256, '\0');
-    for (;;) {
-      const ssize_t length = ::readlink(target->c_str(), text.data(), text.size());
-      if (length < 0) return false;
-      if (static_cast<size_t>(length) < text.size()) {
-        text.resize(static_cast<size_t>(length));
-        break;
-      }
-      text.resize(text.size() * 2);
-    }
-    // A relative link is read from the directory that holds it.
-    *target = !text.empty() && text[0] == '/' ? text : DirectoryOf(*target) + text;
-  }
-  errno = ELOOP;
-  return false;
-}
-
 // Creates a new file in the directory of `path`, with `mode` (less the
 // umask); sets `temporary` to its name. The name is short and hidden,
 // ".zor2check." (or the program's own name) and six random letters, so that it fits wherever
@@ -157,6 +131,29 @@ FileDescriptor CreateTemporary(const std::string& path, mode_t mode, TemporarySl
 }
 
 }  // namespace
+
+bool FinalTarget(const std::string& path, std::string* target) {
+  *target = path;
+  // The kernel's own limit on the links of one path.
+  for (int links = 0; links < 40; ++links) {
+    struct stat status;
+    if (::lstat(target->c_str(), &status) != 0 || !S_ISLNK(status.st_mode)) return true;
+    std::string text(256, '\0');
+    for (;;) {
+      const ssize_t length = ::readlink(target->c_str(), text.data(), text.size());
+      if (length < 0) return false;
+      if (static_cast<size_t>(length) < text.size()) {
+        text.resize(static_cast<size_t>(length));
+        break;
+      }
+      text.resize(text.size() * 2);
+    }
+    // A relative link is read from the directory that holds it.
+    *target = !text.empty() && text[0] == '/' ? text : DirectoryOf(*target) + text;
+  }
+  errno = ELOOP;
+  return false;
+}
 
 void NameTemporaryFilesAfter(std::string_view program) {
   std::string prefix(".");

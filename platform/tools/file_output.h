@@ -20,6 +20,12 @@ namespace zor2 {
 bool WriteFileAtomically(const std::string& path, std::string_view bytes, bool* opened,
                          std::string* err);
 
+// Sets `target` to the file that `path` finally names, its symbolic links
+// followed (the last one may dangle), or to `path` when it is no link: the
+// file that WriteFileAtomically replaces. False with errno set when a link
+// cannot be read or the links loop.
+bool FinalTarget(const std::string& path, std::string* target);
+
 // Names the temporary files of the outputs after `program` ("." + program +
 // "." and six random letters); they are zor2check's otherwise. Call once,
 // before any output is written.

@@ -2,7 +2,14 @@
 
 #include <utility>
 
+#include "platform/tools/printable_path.h"
+
 namespace zor2 {
+
+LogLine& LogLine::operator<<(OutsideText text) {
+  AppendPrintable(text.text(), &text_);
+  return *this;
+}
 
 LogLine::~LogLine() {
   log_->Write(stream_, std::move(text_));

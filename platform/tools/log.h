@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdio>
 #include <string>
 #include <string_view>
@@ -13,9 +14,30 @@ enum class LogStream { kProgress, kWarnings };
 
 class Log;
 
+// Text that comes from outside the program: a path, an argument, a name or a
+// value read from a document or the baseline, a reason the system gives, or a
+// text made of such pieces. A log line writes it with its control characters
+// escaped (AppendPrintable), so that nothing read can split a line or forge
+// one ("...\nERROR: ..."). Every text but the program's own literals reaches
+// a log line as one: the conversions below make it so.
+class OutsideText {
+ public:
+  OutsideText(std::string_view text) : text_(text) {}
+  OutsideText(const std::string& text) : text_(text) {}
+  // A null text is empty.
+  OutsideText(const char* text) : text_(text != nullptr ? text : "") {}
+
+  std::string_view text() const { return text_; }
+
+ private:
+  std::string_view text_;
+};
+
 // One line being written to a log; the line is ended (and handed to the log)
 // when this object goes, at the end of the statement that wrote it:
 //   log.Warning() << "  No Access found for method (ref) : " << name;
+// Only string literals are written as they are; any other text is outside
+// text, escaped.
 class LogLine {
  public:
   LogLine(Log* log, LogStream stream) : log_(log), stream_(stream) {}
@@ -23,14 +45,17 @@ class LogLine {
   LogLine& operator=(const LogLine&) = delete;
   ~LogLine();
 
-  LogLine& operator<<(std::string_view text) {
-    text_ += text;
+  // The program's own words.
+  template <size_t N>
+  LogLine& operator<<(const char (&literal)[N]) {
+    text_ += std::string_view(literal);
     return *this;
   }
-  // A null text writes nothing.
-  LogLine& operator<<(const char* text) { return *this << std::string_view(text ? text : ""); }
-  LogLine& operator<<(const std::string& text) { return *this << std::string_view(text); }
-  LogLine& operator<<(int value) { return *this << std::string_view(std::to_string(value)); }
+  LogLine& operator<<(OutsideText text);
+  LogLine& operator<<(int value) {
+    text_ += std::to_string(value);
+    return *this;
+  }
 
  private:
   Log* log_;

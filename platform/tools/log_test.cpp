@@ -25,5 +25,17 @@ TEST(LogTest, HeldLinesAreReplayedInTheirOrder) {
   EXPECT_EQ(::testing::internal::GetCapturedStdout(), "a-7\nb2\n\n");
 }
 
+// Whatever did not come from the program's own literals is escaped, so that a
+// name read from a document cannot end its line and forge the next one.
+TEST(LogTest, OnlyLiteralsAreWrittenAsTheyAre) {
+  Log log;
+  const std::string name = "Geo\nERROR: forged\t\x7F";
+  log.Progress() << "Checking : " << name << "\t" << std::string_view("\r") << 3;
+  ::testing::internal::CaptureStdout();
+  log.ReplayInto(Log::Standard());
+  EXPECT_EQ(::testing::internal::GetCapturedStdout(),
+            "Checking : Geo\\nERROR: forged\\t\\x7F\t\\r3\n");
+}
+
 }  // namespace
 }  // namespace zor2

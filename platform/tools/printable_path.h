@@ -5,9 +5,14 @@
 
 namespace zor2 {
 
-// `path` as a log line shows it: each control character escaped (tab, line
-// feed and carriage return as "\t", "\n" and "\r", the others as "\xHH"), so
-// that a path never splits or garbles its line. Other bytes are kept.
+// Appends `text` as a log line shows it: each control character escaped (tab,
+// line feed and carriage return as "\t", "\n" and "\r", the others and DEL as
+// "\xHH"), so that the text never splits or garbles its line. Other bytes are
+// kept.
+void AppendPrintable(std::string_view text, std::string* out);
+
+// `path` as a log line shows it (AppendPrintable), for messages written
+// outside the log.
 std::string PrintablePath(std::string_view path);
 
 }  // namespace zor2

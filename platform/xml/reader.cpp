@@ -1,10 +1,6 @@
 #include "platform/xml/reader.h"
 
-#include <fcntl.h>
 #include <strings.h>
-#include <sys/resource.h>
-#include <sys/stat.h>
-#include <sys/sysinfo.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -12,12 +8,12 @@
 #include <cerrno>
 #include <cstdint>
 #include <cstring>
-#include <limits>
 #include <string>
 #include <unordered_set>
 #include <vector>
 
 #include "platform/tools/file_descriptor.h"
+#include "platform/tools/file_input.h"
 #include "platform/xml/text_encoding.h"
 #include "platform/xml/xml_characters.h"
 
@@ -608,73 +604,35 @@ bool Refuse(ReadError* err, int error_number) {
   return false;
 }
 
-}  // namespace
-
-uintmax_t MemoryLimit() {
-  uintmax_t limit = std::numeric_limits<uintmax_t>::max();
-  struct sysinfo machine;
-  if (::sysinfo(&machine) == 0) {
-    limit = (uintmax_t{machine.totalram} + machine.totalswap) * machine.mem_unit;
-  }
-  for (int resource : {RLIMIT_AS, RLIMIT_DATA}) {
-    struct rlimit process;
-    if (::getrlimit(resource, &process) == 0 && process.rlim_cur != RLIM_INFINITY) {
-      limit = std::min<uintmax_t>(limit, process.rlim_cur);
-    }
-  }
-  return limit;
-}
-
-namespace {
-
 // A window of text read at once: large enough that reading costs few calls,
 // small enough to add little to what a document holds.
 constexpr size_t kWindowBytes = size_t{1} << 20;
 
-// Opens the regular file at `path` and sets `size`. It is opened without
-// blocking, since a named pipe (or a device) may stand where a regular file
-// was seen a moment before; only a regular file is read.
+// Opens the regular file at `path` and sets `size`, by the rules of every
+// input file (OpenRegularFile).
 bool OpenDocument(const std::string& path, uintmax_t memory_limit, FileDescriptor* file,
                   size_t* size, ReadError* err) {
-  *file = FileDescriptor(::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
-  if (!file->valid()) return Refuse(err, errno);
-  struct stat status;
-  if (::fstat(file->get(), &status) != 0) return Refuse(err, errno);
-  if (S_ISDIR(status.st_mode)) return Refuse(err, EISDIR);
-  if (!S_ISREG(status.st_mode)) {
-    err->reason = "Not a regular file";
-    return false;
-  }
+  FileReadError error;
+  if (OpenRegularFile(path, memory_limit, file, size, &error)) return true;
   // A document that could never be held is refused before any of it is read.
-  if (static_cast<uintmax_t>(status.st_size) >= memory_limit) {
-    err->reason = kNotEnoughMemory;
-    return false;
-  }
-  *size = static_cast<size_t>(status.st_size);
-  return true;
+  err->reason = error.too_large ? kNotEnoughMemory : std::move(error.reason);
+  return false;
 }
 
 // Reads `file`, of `size` bytes when it was opened, in one piece into `text`.
 bool ReadWhole(int file, size_t size, TextBuffer* text, ReadError* err) {
-  // One byte more than the file's size, so that its end is seen without
-  // growing the buffer (it grows should the file grow meanwhile).
-  size_t limit = size + 1;
-  TextBuffer buffer = TextBuffer::Allocate(limit);
+  TextBuffer buffer;
+  const ReadRoom room = [&buffer](size_t room_size, size_t kept) {
+    TextBuffer larger = TextBuffer::Allocate(room_size);
+    if (kept > 0) std::memcpy(larger.data(), buffer.data(), kept);
+    buffer = std::move(larger);
+    return buffer.data();
+  };
   size_t length = 0;
-  for (;;) {
-    if (length == limit) {
-      limit *= 2;
-      TextBuffer larger = TextBuffer::Allocate(limit);
-      std::memcpy(larger.data(), buffer.data(), length);
-      buffer = std::move(larger);
-    }
-    ssize_t got = ::read(file, buffer.data() + length, limit - length);
-    if (got < 0) {
-      if (errno == EINTR) continue;
-      return Refuse(err, errno);
-    }
-    if (got == 0) break;
-    length += static_cast<size_t>(got);
+  FileReadError error;
+  if (!ReadOpenFile(file, size, room, &length, &error)) {
+    err->reason = std::move(error.reason);
+    return false;
   }
   buffer.size = length;
   buffer.bytes[length] = '\0';

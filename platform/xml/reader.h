@@ -5,6 +5,7 @@
 #include <string>
 #include <string_view>
 
+#include "platform/tools/file_input.h"
 #include "platform/xml/document.h"
 #include "platform/xml/read_error.h"
 
@@ -51,9 +52,8 @@ bool ReadDocumentFile(const std::string& path, std::unique_ptr<Document>* docume
 // contract.
 bool ReadDocumentText(std::string_view text, std::unique_ptr<Document>* document, ReadError* err);
 
-// The most memory the process could ever hold: the machine's memory and swap,
-// or less when the process is limited.
-uintmax_t MemoryLimit();
+// The most memory the process could ever hold (one rule for every input file).
+using ::zor2::MemoryLimit;
 
 // Reads a document held in memory (copied first); same contract.
 bool ReadDocumentText(std::string_view text, std::unique_ptr<Document>* document, ReadError* err);

@@ -27,8 +27,8 @@
 # "zor2check" whatever its path, and every expected file must match byte for
 # byte. A case that cannot be arranged on this machine says so and exits
 # with 77 (skipped), from setup.sh or run.sh as well. The hooks find the
-# program's path in ZOR2CHECK, and this folder's (which holds interpose.c, the
-# library some cases preload) in E2E_DIR.
+# program's path in ZOR2CHECK, and this folder's (which holds interpose.c and
+# memory_limit.c, the libraries some cases preload) in E2E_DIR.
 set -u
 bin=$1
 case_dir=$2

@@ -1,8 +1,10 @@
-// Writes the four exports of two runs into a directory, for the tests that
+// Writes the four exports of sample runs into a directory, for the tests that
 // validate and render them: "example", the findings of the examples/
-// workspace with two of them accepted, and "hostile", findings whose names and
+// workspace with two of them accepted; "hostile", findings whose names and
 // values hold markup, quotes, line breaks, control characters and bytes that
-// are not UTF-8.
+// are not UTF-8; "empty"; "links", names and values that would become links,
+// and a failed run; "many" and "many-full", more findings than a comment
+// holds, capped and not.
 #include <cstdio>
 #include <filesystem>
 #include <string>
@@ -43,7 +45,10 @@ Run ExampleRun() {
                      "examples/reference",
                      "examples/checked",
                      "build/examples-report.xml",
-                     {"-L", "-level", "M4R20"}};
+                     {"-L", "-level", "M4R20"},
+                     {},
+                     false,
+                     {}};
   const std::string doc = "DocumentModel";
   const std::string geo = "Geometry";
   run.findings = {
@@ -89,7 +94,10 @@ Run HostileRun() {
                      "ref dir/<i>a</i>|b",
                      "chk`dir`",
                      "out \"report\".xml",
-                     {"-level", "M4R20 | rm -rf"}};
+                     {"-level", "M4R20 | rm -rf"},
+                     {},
+                     false,
+                     {}};
   const std::string fw = "<b>Bold</b> & \"Co\"";
   run.findings = {
       {MessageCode::kMRTHC, fw, "Public", "a|b <c>.h", "K`lass`", "Get",
@@ -110,9 +118,86 @@ Run HostileRun() {
   };
   run.summary.pairs_compared = 3;
   run.summary.pairs_skipped = 1;
-  run.summary.missing_counterparts = {"Gone <1>.xml", "Old|2.xml"};
+  run.summary.missing_documents = {zor2::Absence("Gone <1>.xml"), zor2::Absence("Old|2.xml")};
   run.summary.stale_baseline_entries = 2;
   Count(run, 2, 2);
+  return run;
+}
+
+// A finding at a place, with its values.
+Finding At(MessageCode code, std::string framework, std::string file, std::string class_name,
+           std::string signature, std::string reference, std::string checked) {
+  Finding finding;
+  finding.code = code;
+  finding.framework = std::move(framework);
+  finding.group = "Public";
+  finding.file = std::move(file);
+  finding.class_name = std::move(class_name);
+  finding.signature = std::move(signature);
+  finding.reference_value = std::move(reference);
+  finding.checked_value = std::move(checked);
+  return finding;
+}
+
+// Names and values that hosting services would turn into links (URLs, "www."
+// names, e-mail addresses), a lone carriage return before Markdown, blank
+// values, a name too long to fit a line, a declaration's line and a capped
+// list of likely replacements; the run failed.
+Run LinksRun() {
+  Run run;
+  run.description = {"example", "https://evil.example/ref", "chk", "out.xml", {}, {}, false, {}};
+  Finding automation =
+      At(MessageCode::kCINMA, "https://evil.example/fw", "www.evil.com/a.h", "user@host.com", "",
+         "https://ref.example", "a\r[x](http://c.example) www.d.com e@f.com");
+  automation.accepted = true;
+  automation.reason = "mail user@host.com or see https://x.example and www.z.com";
+  Finding blank = At(MessageCode::kADVHC, "https://evil.example/fw", "www.evil.com/a.h",
+                     "mailto:me@x.com", "void Set(int a =    )", "   ", "\t");
+  blank.argument = "Arg_1";
+  Finding moved = At(MessageCode::kMRTHC, "Geometry", "geo/Point.h", "GeoPoint",
+                     "double Distance() const", "double", "float");
+  moved.line = 42;
+  Finding deleted = At(MessageCode::kMHBDM, "Geometry", "geo/Point.h", "GeoPoint",
+                       "void Move(int dx)", "void Move(int dx)", "void Move(long dx)");
+  deleted.more_replacements = 5;
+  deleted.line = 7;
+  run.findings = {
+      automation, blank, moved, deleted,
+      At(MessageCode::kFHBD, "Geometry", std::string(3000, 'W') + ".h", "", "", "", "")};
+  run.summary.pairs_compared = 1;
+  run.summary.files_checked = 3;
+  run.summary.failures = {{"https://evil.example/in user@host.com", "No such file or directory"}};
+  run.summary.missing_frameworks = {zor2::Absence("www.fw.com")};
+  run.summary.missing_frameworks[0].accepted = true;
+  run.summary.missing_frameworks[0].reason = "see user@host.com";
+  Count(run, 3, 2);
+  return run;
+}
+
+// More findings than a pull-request comment holds, new and accepted ones
+// interleaved; all of them with `full`.
+Run ManyRun(bool full) {
+  Run run;
+  run.description = {"example", "ref", "chk", "out.xml", {}, {"many.json", "many.md"}, full, {}};
+  for (int i = 0; i < 2500; ++i) {
+    const std::string n = std::to_string(i);
+    // Appended piece by piece: GCC 12 warns wrongly on "literal" + string here.
+    std::string framework = "F";
+    framework += std::to_string(i % 3);
+    std::string file = "File";
+    file.append(n).append(".h");
+    std::string class_name = "Class";
+    class_name += n;
+    std::string signature = "const Value& Method";
+    signature.append(n).append("(int a, int b) const");
+    Finding finding =
+        At(MessageCode::kMRTHC, framework, file, class_name, signature, "double", "float");
+    finding.accepted = i % 5 < 2;
+    run.findings.push_back(finding);
+  }
+  run.summary.pairs_compared = 1;
+  run.summary.files_checked = 2500;
+  Count(run, 2500, 3);
   return run;
 }
 
@@ -148,10 +233,12 @@ int main(int argc, char** argv) {
   std::error_code error;
   std::filesystem::create_directories(directory, error);
   Run empty;
-  empty.description = {"example", "ref.xml", "chk.xml", "out.xml", {}};
+  empty.description = {"example", "ref.xml", "chk.xml", "out.xml", {}, {}, false, {}};
   empty.summary.pairs_compared = 1;
-  const bool written = WriteRun(directory, "example", ExampleRun()) &&
-                       WriteRun(directory, "hostile", HostileRun()) &&
-                       WriteRun(directory, "empty", empty);
+  const bool written =
+      WriteRun(directory, "example", ExampleRun()) &&
+      WriteRun(directory, "hostile", HostileRun()) && WriteRun(directory, "empty", empty) &&
+      WriteRun(directory, "links", LinksRun()) && WriteRun(directory, "many", ManyRun(false)) &&
+      WriteRun(directory, "many-full", ManyRun(true));
   return written ? 0 : 2;
 }

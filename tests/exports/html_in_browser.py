@@ -273,6 +273,26 @@ def check_hostile(browser, directory, checks):
                   page.eval("document.querySelectorAll('header .notes li').length"), 3)
     checks.expect("no dialog opened", page.events("Page.javascriptDialogOpening"), [])
 
+    links = browser.open(os.path.join(directory, "links.html"))
+    checks.expect("a name of 3 000 characters wraps instead of widening the page",
+                  links.eval("document.documentElement.scrollWidth <= window.innerWidth"), True)
+    checks.expect("URL-like names and e-mail addresses are no links",
+                  links.eval("document.querySelectorAll('a').length"), 0)
+    checks.expect("a declaration's line shows as file:line",
+                  links.eval("""Array.from(document.querySelectorAll('.where .line'))
+                      .map(code => code.textContent)"""),
+                  ["geo/Point.h:42", "geo/Point.h:7"])
+    checks.expect("likely replacements left out are counted",
+                  links.eval("document.querySelector('article[data-code=MHBDM] .values td + td')"
+                             ".innerText"),
+                  "void Move(long dx)\nand 5 more")
+    checks.expect("a run that failed says so on top",
+                  [links.eval("document.querySelector('header .verdict').className"),
+                   links.eval("document.querySelector('header .verdict').textContent")],
+                  ["verdict error",
+                   "ERROR: the check is incomplete: an input or output failed; 4 new findings "
+                   "so far"])
+
     empty = browser.open(os.path.join(directory, "empty.html"))
     checks.expect("a run without findings says so",
                   empty.eval("document.querySelector('main').textContent.trim()"), "No finding.")

@@ -1,0 +1,1 @@
+../out_markdown_capped/setup.sh

@@ -1,0 +1,1 @@
+mkfifo args.fifo

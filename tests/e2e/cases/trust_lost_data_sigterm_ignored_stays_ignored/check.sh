@@ -1,0 +1,4 @@
+# The report is left as it was and no temporary file is left beside it.
+[ "$(cat out.xml)" = "old report" ] &&
+  [ "$(LC_ALL=C ls -A | grep -v '^expected\.\|^actual\.\|\.sh$\|^args$\|^interpose\.' | tr '\n' ' ')" = \
+    "chk.xml out.xml ref.xml renaming " ]
