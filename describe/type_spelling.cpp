@@ -304,9 +304,36 @@ std::string WithStandardNames(std::string text) {
   return text;
 }
 
+namespace {
+
+// `text` with the dynamic extent of each std::span, its default argument,
+// left out as the other defaults are: "std::span<int, 18446744073709551615>"
+// is "std::span<int>".
+std::string WithoutDynamicExtents(std::string text) {
+  constexpr std::string_view kSpan = "std::span<";
+  constexpr std::string_view kDynamic = ", 18446744073709551615>";
+  for (size_t at = text.find(kSpan); at != std::string::npos; at = text.find(kSpan, at + 1)) {
+    int depth = 0;
+    for (size_t i = at + kSpan.size() - 1; i < text.size(); ++i) {
+      if (text[i] == '<') ++depth;
+      if (text[i] != '>' || --depth != 0) continue;
+      const size_t tail = i + 1 - kDynamic.size();
+      if (i + 1 >= kDynamic.size() && text.compare(tail, kDynamic.size(), kDynamic) == 0) {
+        text.erase(tail, kDynamic.size() - 1);
+      }
+      break;
+    }
+  }
+  return text;
+}
+
+}  // namespace
+
 std::string TypeIdentity(CXType type, const TemplateParameters& parameters) {
   const CXType canonical = clang_getCanonicalType(type);
-  return WithStandardNames(parameters.Rename(Take(clang_getTypeSpelling(canonical))));
+  std::string text = parameters.Rename(Take(clang_getTypeSpelling(canonical)));
+  if (text.find("std::span<") != std::string::npos) text = WithoutDynamicExtents(std::move(text));
+  return WithStandardNames(std::move(text));
 }
 
 std::string ParameterTypeIdentity(CXType type, const TemplateParameters& parameters) {
