@@ -206,6 +206,7 @@ bool IsVirtualMember(CXCursor cursor) {
 
 std::vector<InheritedVirtual> InheritedVirtuals(CXCursor definition) {
   std::vector<InheritedVirtual> inherited;
+  if (BasesWithAccess(definition).empty()) return inherited;
   std::set<std::string> covered;  // functions that a nearer class overrides
   std::set<std::string> seen;     // classes walked
   // Nearest first: the class itself, then its bases in order, then theirs.

@@ -126,10 +126,11 @@ std::optional<std::string> DefaultTokens(const Tokens& tokens, unsigned end) {
 
 }  // namespace
 
-std::string TemplateHead(CXTranslationUnit unit, CXCursor function) {
+std::string TemplateHead(CXTranslationUnit unit, CXCursor function,
+                         const std::vector<CXCursor>& children) {
   if (clang_getCursorKind(function) != CXCursor_FunctionTemplate) return "";
   std::string parameters;
-  for (CXCursor child : ChildrenOf(function)) {
+  for (CXCursor child : children) {
     if (!IsTemplateParameterKind(clang_getCursorKind(child))) continue;
     if (!parameters.empty()) parameters += ", ";
     parameters += TemplateParameterText(unit, child, 0);
@@ -147,9 +148,10 @@ std::string WrittenParameterType(CXCursor parameter) {
       std::move(text), type.kind == CXType_Pointer || type.kind == CXType_MemberPointer);
 }
 
-std::string Signature(CXTranslationUnit unit, CXCursor function, const MethodDescription& method,
-                      const TemplateParameters& parameters) {
-  std::string signature = TemplateHead(unit, function);
+std::string Signature(CXTranslationUnit unit, CXCursor function,
+                      const std::vector<CXCursor>& children, const MethodDescription& method,
+                      const TemplateParameters& parameters, SourceTexts& texts) {
+  std::string signature = TemplateHead(unit, function, children);
   if (method.type == "Static") signature += "static ";
   if (method.type == "Virtual" || method.type == "PureVirtual") signature += "virtual ";
   const bool conversion = clang_getCursorKind(function) == CXCursor_ConversionFunction ||
@@ -159,7 +161,7 @@ std::string Signature(CXTranslationUnit unit, CXCursor function, const MethodDes
   }
   signature += method.name + "(";
   bool first = true;
-  for (CXCursor child : ChildrenOf(function)) {
+  for (CXCursor child : children) {
     if (clang_getCursorKind(child) != CXCursor_ParmDecl) continue;
     if (!first) signature += ", ";
     first = false;
@@ -169,10 +171,18 @@ std::string Signature(CXTranslationUnit unit, CXCursor function, const MethodDes
   if (clang_isFunctionTypeVariadic(type) != 0) signature += first ? "..." : ", ...";
   signature += ")";
   if (clang_CXXMethod_isConst(function)) signature += " const";
-  const std::string type_text = Take(clang_getTypeSpelling(type));
-  if (type_text.find(") volatile") != std::string::npos ||
-      type_text.find(") const volatile") != std::string::npos) {
-    signature += " volatile";
+  // libclang tells no volatile member function; the function's type says it,
+  // spelled only when its declaration holds the word at all.
+  CXFile file = nullptr;
+  unsigned begin = 0;
+  unsigned end = 0;
+  if (FileExtent(function, &file, &begin, &end) &&
+      texts.Of(file).substr(begin, end - begin).find("volatile") != std::string_view::npos) {
+    const std::string type_text = Take(clang_getTypeSpelling(type));
+    if (type_text.find(") volatile") != std::string::npos ||
+        type_text.find(") const volatile") != std::string::npos) {
+      signature += " volatile";
+    }
   }
   switch (clang_Type_getCXXRefQualifier(type)) {
     case CXRefQualifier_LValue:
@@ -189,22 +199,28 @@ std::string Signature(CXTranslationUnit unit, CXCursor function, const MethodDes
 }
 
 std::optional<std::string> DefaultValue(CXTranslationUnit unit, CXCursor function,
-                                        CXCursor parameter, const TemplateParameters& parameters,
-                                        SourceTexts& texts) {
+                                        const std::vector<CXCursor>& siblings, CXCursor parameter,
+                                        const TemplateParameters& parameters, SourceTexts& texts) {
   CXCursor expression = clang_getNullCursor();
   for (CXCursor child : ChildrenOf(parameter)) {
     if (clang_isExpression(clang_getCursorKind(child))) expression = child;
   }
   if (clang_Cursor_isNull(expression)) return std::nullopt;
-  std::optional<std::string> printed = PrintedDefault(parameter);
-  if (!printed) return std::nullopt;
-  printed = parameters.Rename(*printed);
-  if (IsPointerLike(clang_getCursorType(parameter)) && IsNullPointerText(*printed)) {
-    return std::string("nullptr");
+  // The compiler's text says whether there is a default at all where the
+  // expression could be something else (an array's size), which null
+  // pointer it is, and what a parameter without tokens of its own holds.
+  const bool pointer = IsPointerLike(clang_getCursorType(parameter));
+  const bool written = IsWrittenAt(parameter, texts);
+  std::optional<std::string> printed;
+  if (pointer || !written) {
+    printed = PrintedDefault(parameter);
+    if (!printed) return std::nullopt;
+    printed = parameters.Rename(*printed);
+    if (pointer && IsNullPointerText(*printed)) return std::string("nullptr");
   }
   // A parameter that a macro's body declares (or an unnamed one) has no
   // tokens of its own to read: the compiler's text is the one there is.
-  if (!IsWrittenAt(parameter, texts)) return printed;
+  if (!written) return printed;
 
   // The parameter's own tokens, read where they are written (a macro's
   // argument included); when its default ends inside a macro call, up to the
@@ -217,7 +233,7 @@ std::optional<std::string> DefaultValue(CXTranslationUnit unit, CXCursor functio
   if (!text) {
     CXSourceLocation bound = clang_getRangeEnd(clang_getCursorExtent(function));
     bool after = false;
-    for (CXCursor sibling : ChildrenOf(function)) {
+    for (CXCursor sibling : siblings) {
       if (after && clang_getCursorKind(sibling) == CXCursor_ParmDecl) {
         bound = clang_getCursorLocation(sibling);
         break;
@@ -226,8 +242,12 @@ std::optional<std::string> DefaultValue(CXTranslationUnit unit, CXCursor functio
     }
     text = DefaultTokens(Tokens(unit, clang_getRange(clang_getRangeStart(own), bound)), end);
   }
-  if (!text || text->empty()) return printed;
-  return parameters.Rename(*text);
+  if (text && !text->empty()) return parameters.Rename(*text);
+  if (!printed) {
+    printed = PrintedDefault(parameter);
+    if (printed) printed = parameters.Rename(*printed);
+  }
+  return printed;
 }
 
 }  // namespace zor2::describe

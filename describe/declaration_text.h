@@ -20,16 +20,20 @@ namespace zor2::describe {
 // "template <typename T, int N> " for a function template, empty otherwise:
 // each parameter's kind ("typename", a type, "template <...> class"), "..." for
 // a pack, and its name as declared; default arguments are left out.
-std::string TemplateHead(CXTranslationUnit unit, CXCursor function);
+// `children` are those of `function`.
+std::string TemplateHead(CXTranslationUnit unit, CXCursor function,
+                         const std::vector<CXCursor>& children);
 
 // The one-line signature of `function` (see docs/input-format.md): its
 // template head, "static " or "virtual ", the returned type, the name and the
 // argument types as written (no parameter names, top-level const dropped),
 // then its qualifiers (" const", " volatile", " &", " &&") and " = 0".
 // `method` holds the name, type and returned type already described.
-// Template parameters are written with their declared names.
-std::string Signature(CXTranslationUnit unit, CXCursor function, const MethodDescription& method,
-                      const TemplateParameters& parameters);
+// Template parameters are written with their declared names. `children` are
+// those of `function`; `texts` holds the unit's file texts.
+std::string Signature(CXTranslationUnit unit, CXCursor function,
+                      const std::vector<CXCursor>& children, const MethodDescription& method,
+                      const TemplateParameters& parameters, SourceTexts& texts);
 
 // The declared type of a parameter as written, less a top-level const or
 // volatile (which is not part of the function's type).
@@ -41,9 +45,10 @@ std::string WrittenParameterType(CXCursor parameter);
 // comes from a macro's body; "nullptr" for any null pointer constant given to
 // a pointer; template parameters named by their position, as in types.
 // Nothing when the parameter has no default argument.
-// `texts` holds the unit's file texts.
+// `siblings` are the children of `function`; `texts` holds the unit's file
+// texts.
 std::optional<std::string> DefaultValue(CXTranslationUnit unit, CXCursor function,
-                                        CXCursor parameter, const TemplateParameters& parameters,
-                                        SourceTexts& texts);
+                                        const std::vector<CXCursor>& siblings, CXCursor parameter,
+                                        const TemplateParameters& parameters, SourceTexts& texts);
 
 }  // namespace zor2::describe

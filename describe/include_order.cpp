@@ -4,6 +4,7 @@
 #include <fstream>
 #include <iterator>
 #include <map>
+#include <set>
 #include <sstream>
 #include <string_view>
 
@@ -47,13 +48,23 @@ std::vector<std::string> IncludedNames(std::string_view source) {
 std::vector<size_t> IncludeOrder(const std::string& dir, const std::vector<std::string>& headers,
                                  const std::vector<std::string>& roots) {
   std::map<std::string, size_t> index_of_path;
-  for (size_t h = 0; h < headers.size(); ++h)
+  std::set<std::string_view> base_names;  // an include of another name is no header of these
+  for (size_t h = 0; h < headers.size(); ++h) {
     index_of_path[Normal(HeaderPath(dir, headers[h]))] = h;
+    const size_t slash = headers[h].rfind('/');
+    base_names.insert(
+        std::string_view(headers[h]).substr(slash == std::string::npos ? 0 : slash + 1));
+  }
   std::vector<bool> included(headers.size(), false);
   for (size_t h = 0; h < headers.size(); ++h) {
     const std::string path = HeaderPath(dir, headers[h]);
     const std::string beside = std::filesystem::path(path).parent_path().string();
     for (const std::string& name : IncludedNames(FileText(path))) {
+      const size_t slash = name.rfind('/');
+      if (base_names.count(
+              std::string_view(name).substr(slash == std::string::npos ? 0 : slash + 1)) == 0) {
+        continue;
+      }
       std::vector<std::string> places = {HeaderPath(beside, name)};
       for (const std::string& root : roots) places.push_back(HeaderPath(root, name));
       for (const std::string& place : places) {

@@ -195,6 +195,7 @@ std::string TemplateParameters::PositionalName(unsigned depth, unsigned index) {
 }
 
 std::string TemplateParameters::Written(std::string_view text) const {
+  if (text.find("type-parameter-") == std::string_view::npos) return std::string(text);
   std::string written;
   written.reserve(text.size());
   size_t pos = 0;
@@ -216,6 +217,9 @@ std::string TemplateParameters::Written(std::string_view text) const {
 }
 
 std::string TemplateParameters::Rename(std::string_view text) const {
+  if (positional_of_declared_.empty() && text.find("type-parameter-") == std::string_view::npos) {
+    return std::string(text);
+  }
   std::string renamed;
   renamed.reserve(text.size());
   size_t pos = 0;
@@ -258,6 +262,9 @@ std::string TemplateParameters::Rename(std::string_view text) const {
 }
 
 std::string WithStandardNames(std::string text) {
+  if (text.find("std::") == std::string::npos && text.find("_IO_FILE") == std::string::npos) {
+    return text;
+  }
   // The library's own inline namespaces, which clang prints where leaving
   // them out would be ambiguous.
   for (std::string_view inner : {"std::__cxx11::", "std::__1::"}) {

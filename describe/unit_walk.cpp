@@ -444,18 +444,19 @@ class UnitWalker {
     method.line = LineOf(cursor);
 
     std::set<std::string> retval_names(tags.retval_names.begin(), tags.retval_names.end());
-    for (CXCursor child : ChildrenOf(cursor)) {
+    const std::vector<CXCursor> children = ChildrenOf(cursor);
+    for (CXCursor child : children) {
       if (clang_getCursorKind(child) != CXCursor_ParmDecl) continue;
       ArgDescription arg;
       arg.type = ParameterTypeIdentity(clang_getCursorType(child), parameters);
       arg.name = Take(clang_getCursorSpelling(child));
-      arg.value = DefaultValue(unit_, cursor, child, parameters, texts_);
+      arg.value = DefaultValue(unit_, cursor, children, child, parameters, texts_);
       arg.retval = !arg.name.empty() && retval_names.erase(arg.name) > 0;
       method.args.push_back(std::move(arg));
     }
     for (const std::string& name : retval_names) Warn(cursor, owner, method, name);
 
-    method.signature = Signature(unit_, cursor, method, parameters);
+    method.signature = Signature(unit_, cursor, children, method, parameters, texts_);
     return method;
   }
 
