@@ -4,7 +4,9 @@
 #
 #   args               one argument per line, paths relative to the folder
 #   expected.status    the exit status (0 when absent)
-#   expected.stdout    standard output (empty when absent)
+#   expected.stdout    standard output (empty when absent; a case whose output
+#                      is only the run's banner links to one of the
+#                      ../../expected.banner*.stdout)
 #   expected.stderr    standard error (empty when absent)
 #   expected.report.xml  when present, compared with the file out.xml
 #   expected.help.htm    when present, compared with the file help.htm (the cases
