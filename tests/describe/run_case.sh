@@ -14,8 +14,10 @@
 #                      wrote (expected.out.xml with out.xml, expected.report.xml with report.xml)
 #
 # With UPDATE=1 in the environment, the expected files of the case folder are rewritten from what
-# the steps produced (expected.stdout, .stderr and .status when not empty or all 0, and each
-# expected.NAME that the folder already holds), to be reviewed as a diff.
+# the steps produced (expected.stdout, .stderr and .status when not empty or all 0 or already
+# there, and each expected.NAME that the folder already holds), to be reviewed as a diff; an
+# expected file that is a link is written through, to the file it shares. The case still fails
+# on what changed.
 #
 # The case runs in a fresh copy of its folder (links followed, so that cases share the test
 # library through a link), with each program named as in the steps whatever its path, and every
@@ -24,7 +26,7 @@ set -u
 tests_dir=$(cd "$(dirname "$0")/.." && pwd)
 describe_bin=$(realpath "$1")
 check_bin=$(realpath "$2")
-case_dir=$3
+case_dir=$(cd "$3" && pwd) || exit 1
 
 ZOR2DESCRIBE=$describe_bin
 ZOR2CHECK=$check_bin
@@ -61,26 +63,26 @@ while read -r program arguments; do
   echo $? >>actual.status
 done <steps
 
+# shellcheck source=tests/expect.sh
+source "$tests_dir/expect.sh"
+
 if [ "${UPDATE:-0}" = 1 ]; then
   for name in stdout stderr; do
-    if [ -s "actual.$name" ] || [ -f "$case_dir/expected.$name" ]; then
-      cp "actual.$name" "$case_dir/expected.$name"
+    if [ -s "actual.$name" ] || [ -e "$case_dir/expected.$name" ]; then
+      update_expected "actual.$name" "$case_dir/expected.$name"
     fi
   done
-  if grep -qv '^0$' actual.status || [ -f "$case_dir/expected.status" ]; then
-    cp actual.status "$case_dir/expected.status"
+  if grep -qv '^0$' actual.status || [ -e "$case_dir/expected.status" ]; then
+    update_expected actual.status "$case_dir/expected.status"
   fi
   for expected in "$case_dir"/expected.*; do
     name=${expected##*/expected.}
     case "$name" in
       status | stdout | stderr) ;;
-      *) [ -f "$name" ] && cp "$name" "$expected" ;;
+      *) [ -f "$name" ] && update_expected "$name" "$expected" ;;
     esac
   done
 fi
-
-# shellcheck source=tests/expect.sh
-source "$tests_dir/expect.sh"
 
 [ -f expected.status ] || sed 's/.*/0/' actual.status >expected.status
 [ -f expected.stdout ] || : >expected.stdout

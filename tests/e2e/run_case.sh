@@ -4,7 +4,9 @@
 #
 #   args               one argument per line, paths relative to the folder
 #   expected.status    the exit status (0 when absent)
-#   expected.stdout    standard output (empty when absent)
+#   expected.stdout    standard output (empty when absent; a case whose output
+#                      is only the run's banner links to one of the
+#                      ../../expected.banner*.stdout)
 #   expected.stderr    standard error (empty when absent)
 #   expected.report.xml  when present, compared with the file out.xml
 #   expected.help.htm    when present, compared with the file help.htm (the cases
@@ -29,17 +31,39 @@
 # with 77 (skipped), from setup.sh or run.sh as well. The hooks find the
 # program's path in ZOR2CHECK, and this folder's (which holds interpose.c and
 # memory_limit.c, the libraries some cases preload) in E2E_DIR.
+#
+# A folder holding a file "table" holds many cases, one a row, each run as
+#   run_case.sh PROGRAM FOLDER ROW
+# (table_row.sh says what a row holds): the row becomes a case folder as above.
+#
+# With UPDATE=1 in the environment, the case's expected files are rewritten
+# from what the program produced, to be reviewed as a diff: expected.stdout,
+# .stderr and .status when not empty or not 0 or already there, and each
+# expected.report.xml, expected.help.htm and expected.files/NAME already there
+# (for a row, its status, its texts and its report). An expected file that is a
+# link is written through, once, to the file it shares: when only this case
+# changed, give it a file of its own first. The case still fails on what
+# changed.
 set -u
 bin=$1
-case_dir=$2
+case_dir=$(cd "$2" && pwd) || exit 1
+row=${3:-}
 E2E_DIR=$(cd "$(dirname "$0")" && pwd)
 tests_dir=$(dirname "$E2E_DIR")
 export E2E_DIR
 
 work=$(mktemp -d)
 trap 'chmod -R u+rwX "$work" 2>/dev/null; rm -rf "$work"' EXIT
-# Links are followed, so that cases can share one expected file (the help page).
-cp -RL "$case_dir/." "$work/"
+# shellcheck source=tests/expect.sh
+source "$tests_dir/expect.sh"
+if [ -n "$row" ]; then
+  # shellcheck source=tests/e2e/table_row.sh
+  source "$E2E_DIR/table_row.sh"
+  row_case "$case_dir" "$row" "$work" || exit 1
+else
+  # Links are followed, so that cases can share one expected file (the help page).
+  cp -RL "$case_dir/." "$work/"
+fi
 cd "$work" || exit 1
 export ZOR2CHECK=$bin
 if [ -f setup.sh ]; then
@@ -74,9 +98,6 @@ if [ -f run.sh ] && [ "$status" -eq 77 ]; then
   exit 77
 fi
 
-# shellcheck source=tests/expect.sh
-source "$tests_dir/expect.sh"
-
 want_status=0
 [ -f expected.status ] && want_status=$(cat expected.status)
 if [ "$status" != "$want_status" ]; then
@@ -95,5 +116,29 @@ fi
 if [ -f check.sh ] && ! bash check.sh; then
   echo "--- check.sh failed"
   failed=1
+fi
+
+if [ "${UPDATE:-0}" = 1 ]; then
+  if [ -n "$row" ]; then
+    row_update "$case_dir" "$row" "$status"
+  else
+    for name in stdout stderr; do
+      if [ -s "actual.$name" ] || [ -e "$case_dir/expected.$name" ]; then
+        update_expected "actual.$name" "$case_dir/expected.$name"
+      fi
+    done
+    if [ "$status" != 0 ] || [ -e "$case_dir/expected.status" ]; then
+      echo "$status" >actual.status
+      update_expected actual.status "$case_dir/expected.status"
+    fi
+    [ -e "$case_dir/expected.report.xml" ] && [ -f out.xml ] &&
+      update_expected out.xml "$case_dir/expected.report.xml"
+    [ -e "$case_dir/expected.help.htm" ] && [ -f help.htm ] &&
+      update_expected help.htm "$case_dir/expected.help.htm"
+    for expected_file in "$case_dir"/expected.files/*; do
+      name=${expected_file##*/}
+      [ -f "$name" ] && update_expected "$name" "$expected_file"
+    done
+  fi
 fi
 exit $failed

@@ -1,2 +1,0 @@
-# Git keeps no empty directory: make it here.
-mkdir -p options
